@@ -1,0 +1,104 @@
+#include "ryx/headless/form_file.h"
+
+#include <gtest/gtest.h>
+
+#include <fstream>
+
+#include "form_fixture.h"
+#include "ryx/errors.h"
+#include "ryx/policy_status.h"
+
+using namespace ryx;
+using namespace ryx::headless;
+
+namespace {
+
+void writeFile(const std::filesystem::path& p, std::string_view text) {
+    std::ofstream(p, std::ios::binary) << text;
+}
+
+std::string readFile(const std::filesystem::path& p) {
+    std::ifstream in(p, std::ios::binary);
+    return {std::istreambuf_iterator<char>(in), {}};
+}
+
+TEST(FormFile, WhatIsNotAFormFileIsAClearErrorNamingTheFile) {
+    ryx::testing::TempFolder tmp;
+    struct Case {
+        const char* content;  // null: no file at all
+        const char* reason;
+    } cases[] = {
+        {nullptr, "No such file"},
+        {"", "invalid JSON"},
+        {"{\"format\": \"ryx-form/1\", \"controls\": {", "invalid JSON"},
+        {"[1, 2]", "not a JSON object"},
+        {"{}", "no \"format\""},
+        {"{\"format\": \"other/2\", \"controls\": {}}", "\"other/2\""},
+        {"{\"format\": \"ryx-form/1\"}", "no \"controls\""},
+        {"{\"format\": \"ryx-form/1\", \"controls\": []}", "no \"controls\""},
+        {"\xff\xfe garbage", "invalid JSON"},
+    };
+    int n = 0;
+    for (const Case& c : cases) {
+        const auto file = tmp / ("form" + std::to_string(n++) + ".json");
+        if (c.content) writeFile(file, c.content);
+        Form form;
+        try {
+            loadForm(form, file);
+            ADD_FAILURE() << "no error for " << (c.content ? c.content : "a missing file");
+        } catch (const FormFileError& e) {
+            const std::string message = e.what();
+            EXPECT_NE(message.find(file.string()), std::string::npos) << message;
+            EXPECT_NE(message.find(c.reason), std::string::npos) << message;
+        }
+        EXPECT_TRUE(form.sites().empty());
+    }
+}
+
+TEST(FormFile, ControlsOfUnknownOrOtherTypesArePassedOver) {
+    Form form;
+    form.add<RYXPolicyStatus>("ps");
+    const char* doc = R"({"format": "ryx-form/1", "controls": {
+        "ps": {"type": "RYXDateRangeX", "properties": {}},
+        "other": {"type": "NoSuchControl"},
+        "bare": 5,
+        "fresh": {"type": "RYXPolicyStatus", "properties": {"Titlecolor": 7}}}})";
+    LoadReport report = loadFormJson(form, doc, "inline");
+    EXPECT_EQ(report.skipped.size(), 3u);
+    ASSERT_NE(form.findSite("fresh"), nullptr);
+    EXPECT_EQ(dynamic_cast<RYXPolicyStatus&>(form.site("fresh").control()).TitleColor(), 7);
+}
+
+TEST(FormFile, SavingReplacesTheFileWholeAndLeavesNoTemporaryFile) {
+    ryx::testing::TempFolder tmp;
+    const auto file = tmp / "form.json";
+    writeFile(file, "old contents");
+    Form form;
+    auto& ps = form.add<RYXPolicyStatus>("ps \"quoted\" \xc3\xa9");
+    ps.setCrystalStyle(false);
+    saveForm(form, file);
+    EXPECT_EQ(std::distance(std::filesystem::directory_iterator(tmp.path()), {}), 1);
+    const std::string text = readFile(file);
+    EXPECT_NE(text.find("\"format\": \"ryx-form/1\""), std::string::npos);
+
+    Form loaded;
+    loadForm(loaded, file);
+    ASSERT_EQ(loaded.sites().size(), 1u);
+    EXPECT_EQ(loaded.sites()[0]->name(), "ps \"quoted\" \xc3\xa9");
+    EXPECT_FALSE(dynamic_cast<RYXPolicyStatus&>(loaded.sites()[0]->control()).CrystalStyle());
+}
+
+TEST(FormFile, ASaveThatCannotBeWrittenNamesTheFile) {
+    ryx::testing::TempFolder tmp;
+    Form form;
+    form.add<RYXPolicyStatus>("ps");
+    const auto file = tmp / "missing-folder" / "form.json";
+    try {
+        saveForm(form, file);
+        FAIL() << "no error";
+    } catch (const FormFileError& e) {
+        EXPECT_NE(std::string(e.what()).find(file.string()), std::string::npos);
+    }
+}
+
+}  // namespace

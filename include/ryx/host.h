@@ -133,6 +133,7 @@ struct WidgetDesign {
     bool inFrame = true;      // inside the control's frame, or straight on the surface
     std::string_view mask{};  // masked edit only
     std::string_view toolTip{};
+    std::string_view picture{};  // a named picture of the design: "calendar", "popup"
     std::span<const std::string_view> items{};  // list box rows of the design
 };
 

@@ -12,6 +12,13 @@
 
 #include "ryx/headless/form.h"
 
+namespace ryx {
+// Shows a Variant's kind and value in test failures.
+inline void PrintTo(const Variant& v, std::ostream* os) {
+    *os << v.describe();
+}
+}  // namespace ryx
+
 namespace ryx::testing {
 
 // Counts the events of one number that a control raised.

@@ -1,0 +1,16 @@
+// One QWidget per control: each owns its core control (control()) and places a new instance
+// at the control's design size. Events arrive as the signals of ControlHost.
+#pragma once
+
+#include "ryx/policy_status.h"
+#include "ryx/qt/control_host.h"
+
+namespace ryx::qt {
+
+class PolicyStatusWidget : public ControlWidget<RYXPolicyStatus> {
+  public:
+    explicit PolicyStatusWidget(QWidget* parent = nullptr, bool newInstance = true)
+        : ControlWidget(parent, 2905, 1580, newInstance) {}
+};
+
+}  // namespace ryx::qt

@@ -1,8 +1,4 @@
-// Form files: the properties of every control on a form, saved as a JSON document
-//   {"format": "ryx-form/1",
-//    "controls": {"<name>": {"type": "RYXPolicyStatus", "properties": {...}}}}
-// Saving is atomic (a temporary file in the same folder, flushed to disk, then renamed over
-// the old one), so a crash in the middle of a save leaves the previous file whole.
+// Form files of a headless form (the document is described in ryx/common/form_document.h).
 #pragma once
 
 #include <filesystem>
@@ -13,8 +9,6 @@
 #include "ryx/headless/form.h"
 
 namespace ryx::headless {
-
-inline constexpr std::string_view kFormFormat = "ryx-form/1";
 
 // What a load passed over: controls of unknown type or of another type than the form holds.
 struct LoadReport {

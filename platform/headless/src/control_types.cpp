@@ -2,6 +2,7 @@
 #include "control_types.h"
 
 #include "ryx/policy_status.h"
+#include "ryx/range_selector.h"
 
 namespace ryx::headless {
 namespace {
@@ -18,6 +19,7 @@ struct ControlType {
 
 constexpr ControlType kControlTypes[] = {
     {"RYXPolicyStatus", &make<RYXPolicyStatus>},
+    {"RYXRangeSelector", &make<RYXRangeSelector>},
 };
 
 }  // namespace

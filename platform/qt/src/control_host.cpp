@@ -6,6 +6,7 @@
 #include <QKeyEvent>
 #include <QMouseEvent>
 #include <QResizeEvent>
+#include <algorithm>
 #include <cmath>
 
 #include "qt_widgets.h"
@@ -105,6 +106,16 @@ void ControlHost::setInitialSize(Twips width, Twips height) {
 
 void ControlHost::attachControl(std::unique_ptr<HostedControl> control) {
     control_ = std::move(control);
+}
+
+void ControlHost::applyTabOrder() {
+    std::vector<QtNode*> stops;
+    for (const auto& n : nodes_)
+        if (n->takesFocus() && n->tabIndex() >= 0) stops.push_back(n.get());
+    std::stable_sort(stops.begin(), stops.end(),
+                     [](QtNode* a, QtNode* b) { return a->tabIndex() < b->tabIndex(); });
+    for (size_t i = 1; i < stops.size(); ++i)
+        QWidget::setTabOrder(stops[i - 1]->widget(), stops[i]->widget());
 }
 
 int ControlHost::toPixels(Twips t) const {

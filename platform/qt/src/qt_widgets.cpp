@@ -97,6 +97,7 @@ QtNode::QtNode(ControlHost& host, const WidgetDesign& d, QWidget* widget)
       name_(d.name),
       index_(d.index),
       inFrame_(d.inFrame),
+      tabIndex_(d.tabIndex),
       left_(d.left),
       top_(d.top),
       width_(d.width),

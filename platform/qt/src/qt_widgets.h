@@ -35,6 +35,7 @@ class QtNode {
     const std::string& name() const { return name_; }
     int16_t index() const { return index_; }
     bool inFrame() const { return inFrame_; }
+    int tabIndex() const { return tabIndex_; }
     bool isEnabledFlag() const { return enabled_; }
     bool isVisibleFlag() const { return visible_; }
     std::string displayName() const;
@@ -72,6 +73,7 @@ class QtNode {
     std::string name_;
     int16_t index_;
     bool inFrame_;
+    int tabIndex_;
     bool enabled_ = true;
     bool visible_ = true;
     Twips left_, top_, width_, height_;

@@ -89,6 +89,8 @@ class ControlHost : public QWidget, public ryx::Container {
 
   protected:
     void setInitialSize(Twips width, Twips height);
+    // Orders the children's focus chain by the tab indexes of the design.
+    void applyTabOrder();
     void attachControl(std::unique_ptr<HostedControl> control);
     bool eventFilter(QObject* watched, QEvent* event) override;
     void resizeEvent(QResizeEvent* e) override;
@@ -136,6 +138,7 @@ class ControlWidget : public ControlHost {
         auto control = std::make_unique<C>(static_cast<Container&>(*this));
         control_ = control.get();
         attachControl(std::move(control));
+        applyTabOrder();
         if (newInstance) {
             control_->InitProperties();
             control_->Resize();

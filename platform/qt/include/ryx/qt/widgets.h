@@ -4,6 +4,7 @@
 
 #include "ryx/policy_status.h"
 #include "ryx/qt/control_host.h"
+#include "ryx/range_selector.h"
 
 namespace ryx::qt {
 
@@ -11,6 +12,12 @@ class PolicyStatusWidget : public ControlWidget<RYXPolicyStatus> {
   public:
     explicit PolicyStatusWidget(QWidget* parent = nullptr, bool newInstance = true)
         : ControlWidget(parent, 2905, 1580, newInstance) {}
+};
+
+class RangeSelectorWidget : public ControlWidget<RYXRangeSelector> {
+  public:
+    explicit RangeSelectorWidget(QWidget* parent = nullptr, bool newInstance = true)
+        : ControlWidget(parent, 3615, 1200, newInstance) {}
 };
 
 }  // namespace ryx::qt

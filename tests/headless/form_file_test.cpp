@@ -55,6 +55,14 @@ TEST(FormFile, WhatIsNotAFormFileIsAClearErrorNamingTheFile) {
     }
 }
 
+// Found by fuzzing: the JSON reader reports a number beyond the range of a double with an
+// error of its own kind, which ended the program instead of becoming a FormFileError.
+TEST(FormFile, ANumberTooLargeForADoubleIsAClearErrorNotACrash) {
+    Form form;
+    EXPECT_THROW(loadFormJson(form, R"({"format": "ryx-form/1", "controls": {"x": 1e999}})", "f"),
+                 FormFileError);
+}
+
 TEST(FormFile, ControlsOfUnknownOrOtherTypesArePassedOver) {
     Form form;
     form.add<RYXPolicyStatus>("ps");

@@ -145,7 +145,7 @@ std::vector<FormEntry> parseForm(std::string_view text, std::string_view source)
     json doc;
     try {
         doc = json::parse(text);
-    } catch (const json::parse_error& e) {
+    } catch (const json::exception& e) {  // a syntax error, or a number out of range
         notAForm(source, std::string("invalid JSON (") + e.what() + ")");
     }
     if (!doc.is_object()) notAForm(source, "the document is not a JSON object");

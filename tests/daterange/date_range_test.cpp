@@ -28,7 +28,6 @@ class DateRangeTest : public ::testing::Test {
         site->clearRecords();
     }
 
-    // The rules' settings and the dates in the boxes, as a host sets them.
     void setUp(int style, int allowBlank, const char* s, const char* e) {
         dr->setDateStyle(style);
         dr->setAllowBlank(allowBlank);
@@ -39,14 +38,7 @@ class DateRangeTest : public ::testing::Test {
         form.setFocus(box);
         form.type(text);
     }
-    // Sets the dates while the end box has the focus, then leaves it for the start box: the
-    // end box's own rules only.
-    void leaveEndBox(int style, int allowBlank, const char* s, const char* e) {
-        form.setFocus(*end);
-        setUp(style, allowBlank, s, e);
-        site->clearRecords();
-        form.setFocus(*start);
-    }
+    HImage& image(int16_t i) { return site->child<HImage>("ImgCalendar", i); }
 
     Form form;
     RYXDateRange* dr = nullptr;
@@ -57,65 +49,13 @@ class DateRangeTest : public ::testing::Test {
     HTextBox* after = nullptr;
 };
 
-// ---- appearance ----------------------------------------------------------------------------
+// ---- appearance and persistence ------------------------------------------------------------
 
-TEST_F(DateRangeTest, ANewControlShowsItsDesignAtItsOneSize) {
-    EXPECT_EQ(site->width(), 2430);
-    EXPECT_EQ(site->height(), 1305);
+TEST_F(DateRangeTest, OneSizeFooterByStyleAndCheckedSetters) {
     site->resizeByHost(5000, 100);
     EXPECT_EQ(site->width(), 2430);
     EXPECT_EQ(site->height(), 1305);
-    EXPECT_EQ(dr->Caption(), "&Date Range");
-    EXPECT_EQ(dr->FootNote(), "Enter Valid Dates");
-    EXPECT_EQ(start->text(), kEmpty);
-    EXPECT_EQ(start->mask(), "##/##/####");
-    EXPECT_EQ(dr->BackColor(), 0x00C0FFFF);
-    EXPECT_EQ(dr->TitleColor(), 192);
-    EXPECT_EQ(dr->ForeColor(), 0x00E6FEFF);
-    EXPECT_TRUE(dr->CrystalStyle());
-    EXPECT_TRUE(dr->ShowCalendar());
-    EXPECT_EQ(dr->CalendarPosition(), 2);
-    EXPECT_EQ(&dr->Font(), &site->font());
-    dr->setInnerColor(0x123);
-    EXPECT_EQ(dr->InnerColor(), 0);
-}
 
-TEST_F(DateRangeTest, SettersStoreCheckAndNotify) {
-    dr->setBackColor(1);
-    dr->setForeColor(2);
-    dr->setTitleColor(3);
-    dr->setShowCalendar(false);
-    dr->setCalendarPosition(0);
-    dr->setCaption("Period");
-    dr->setFootNote("Any dates");
-    dr->setCrystalStyle(false);
-    dr->setAllowBlank(3);
-    dr->setMonth(13);
-    dr->setMonth(0);
-    dr->setYear(1599);
-    dr->setYear(2201);
-    dr->setYear(1600);
-    dr->setYear(2200);
-    EXPECT_EQ(site->notifications(),
-              (std::vector<std::string>{"BackColor", "ForeColor", "Titlecolor", "ShowCalendar",
-                                        "CalendarPosition", "Caption", "FootNote", "CrystalStyle",
-                                        "Month", "Year", "Year"}));
-    EXPECT_EQ(site->surfaceBackColor(), 2);
-    EXPECT_EQ(end->backColor(), 2);
-    EXPECT_FALSE(site->child<HImage>("ImgCalendar", 1).visible());
-    EXPECT_EQ(site->child<HImage>("ImgCalendar", 0).leftPos(), 1950);  // nothing moves
-    EXPECT_EQ(dr->Year(), 2200);
-    EXPECT_EQ(dr->AllowBlank(), 3);
-
-    EXPECT_THROW(dr->setDateStyle(256), OverflowError);
-    EXPECT_THROW(dr->setAllowBlank(-1), OverflowError);
-    EXPECT_THROW(dr->setCalendarPosition(300), OverflowError);
-    EXPECT_EQ(dr->DateStyle(), 0);
-    EXPECT_EQ(dr->AllowBlank(), 3);
-    EXPECT_EQ(dr->CalendarPosition(), 0);
-}
-
-TEST_F(DateRangeTest, TheFooterFollowsTheDateStyle) {
     const char* footers[] = {"Enter Valid Dates", "Enter dates in same month",
                              "Enter dates in same year", "Enter dates in a Financial Year",
                              "Enter dates in a Financial Year"};  // 4 keeps the message
@@ -123,29 +63,41 @@ TEST_F(DateRangeTest, TheFooterFollowsTheDateStyle) {
         dr->setDateStyle(style);
         EXPECT_EQ(dr->FootNote(), footers[style]);
     }
-    dr->setFootNote("Own words");
-    EXPECT_EQ(dr->FootNote(), "Own words");
+    EXPECT_THROW(dr->setDateStyle(256), OverflowError);
+    EXPECT_THROW(dr->setAllowBlank(-1), OverflowError);
+    EXPECT_EQ(dr->DateStyle(), 4);
+
+    site->clearRecords();
+    dr->setForeColor(2);
+    dr->setTitleColor(3);
+    dr->setAllowBlank(3);
+    for (int month : {13, 0})
+        dr->setMonth(month);
+    for (int year : {1599, 2201, 1600, 2200})
+        dr->setYear(year);
+    dr->setInnerColor(5);
+    EXPECT_EQ(site->notifications(),
+              (std::vector<std::string>{"ForeColor", "Titlecolor", "Month", "Year", "Year"}));
+    EXPECT_EQ(site->surfaceBackColor(), 2);
+    EXPECT_EQ(end->backColor(), 2);
+    EXPECT_EQ(dr->Year(), 2200);
+    EXPECT_EQ(dr->InnerColor(), 0);
 }
 
 TEST_F(DateRangeTest, DisabledGreysTheDateTextAndLockedTakesNoInput) {
     dr->setEnabled(false);
     EXPECT_FALSE(site->child<HFrame>("fraDateRange").isEnabled());
-    for (const char* label : {"lblStart", "lblEnd", "lblFooter"})
-        EXPECT_FALSE(site->child<HLabel>(label).isEnabled());
-    EXPECT_EQ(start->foreColor(), kSystemLight3D);
+    EXPECT_FALSE(site->child<HLabel>("lblFooter").isEnabled());
     EXPECT_EQ(end->foreColor(), kSystemLight3D);
-    EXPECT_TRUE(site->child<HImage>("ImgCalendar", 0).isEnabled());
+    EXPECT_TRUE(image(0).isEnabled());
     dr->setEnabled(true);
-    EXPECT_EQ(start->foreColor(), kBlack);
+    EXPECT_EQ(end->foreColor(), kBlack);
 
     dr->setLocked(true);
-    EXPECT_FALSE(site->surfaceEnabled());
-    form.click(site->child<HImage>("ImgCalendar", 0));
+    form.click(image(0));
     EXPECT_FALSE(dr->ImageClick);
     EXPECT_EQ(countEvents(form, "dr", EventId::ButtonClick), 0);
 }
-
-// ---- persistence ---------------------------------------------------------------------------
 
 TEST_F(DateRangeTest, EveryKeySurvivesSaveAndReload) {
     ryx::testing::TempFolder tmp;
@@ -167,23 +119,11 @@ TEST_F(DateRangeTest, EveryKeySurvivesSaveAndReload) {
 
     Form loaded;
     loadForm(loaded, tmp / "form.json");
+    EXPECT_EQ(formToJson(loaded), formToJson(form));
     auto& again = dynamic_cast<RYXDateRange&>(loaded.site("dr").control());
-    EXPECT_EQ(again.Month(), 5);
-    EXPECT_EQ(again.Year(), 2004);
-    EXPECT_EQ(again.AllowBlank(), 2);
-    EXPECT_EQ(again.DateStyle(), 1);
     EXPECT_EQ(again.FootNote(), "Enter dates in same month");
-    EXPECT_FALSE(again.CrystalStyle());
-    EXPECT_TRUE(again.Locked());
-    EXPECT_FALSE(again.Enabled());
-    EXPECT_FALSE(again.ShowCalendar());
     EXPECT_EQ(again.ForeColor(), 0x111111);
-    EXPECT_EQ(again.BackColor(), 0x222222);
-    EXPECT_EQ(again.TitleColor(), 0x333333);
-    EXPECT_EQ(again.CalendarPosition(), 3);
-    EXPECT_EQ(again.Caption(), "Period");
     EXPECT_EQ(loaded.site("dr").child<HMaskedEdit>("MskDate", 0).text(), kEmpty);
-    EXPECT_EQ(loaded.site("dr").width(), 2430);
 }
 
 TEST_F(DateRangeTest, LoadingIgnoresDamagedValuesKeyByKey) {
@@ -199,51 +139,36 @@ TEST_F(DateRangeTest, LoadingIgnoresDamagedValuesKeyByKey) {
     EXPECT_EQ(dr->AllowBlank(), 1);
     EXPECT_EQ(dr->FootNote(), "Saved words");
     EXPECT_EQ(dr->Caption(), "&Date Range");
-
-    loadFormJson(form, R"({"format": "ryx-form/1", "controls": {"dr": {"type": "RYXDateRange"}}})",
-                 "inline");
-    EXPECT_EQ(dr->Month(), 0);
-    EXPECT_EQ(dr->Caption(), "Date Range");
 }
 
-// ---- default dates -------------------------------------------------------------------------
+// ---- default dates and reading -------------------------------------------------------------
 
 TEST_F(DateRangeTest, DefaultDatesFollowTheStyleMonthYearAndToday) {
     struct Case {
-        int style, month, year;
-        CivilDate today;
-        const char* startBox;
-        const char* first;
-        const char* last;
-    } cases[] = {
-        {0, 0, 0, {2001, 8, 15}, "", "01/08/2001", "31/08/2001"},
-        {0, 2, 2004, {2001, 8, 15}, "", "01/02/2004", "29/02/2004"},
-        {1, 2, 2100, {2001, 8, 15}, "", "01/02/2100", "28/02/2100"},
-        {1, 0, 0, {2001, 8, 15}, "10/02/2000", "01/08/2001", "29/02/2000"},
-        {2, 0, 0, {2001, 8, 15}, "10/03/2001", "01/01/2001", "31/12/2001"},
-        {2, 6, 0, {2001, 8, 15}, "", "01/06/2001", "31/12/2001"},
-        {3, 0, 0, {2001, 8, 15}, "", "01/04/2001", "31/03/2002"},
-        {3, 0, 0, {2001, 4, 1}, "", "01/04/2001", "31/03/2002"},
-        {3, 0, 0, {2001, 3, 31}, "", "01/04/2000", "31/03/2001"},
-        {3, 0, 0, {2001, 1, 1}, "01/04/2000", "01/04/2000", "31/03/2001"},
-        {3, 0, 0, {2001, 2, 15}, "15/02/2001", "01/04/2000", "31/03/2001"},
-        {3, 2, 0, {2001, 8, 15}, "", "01/02/2000", "31/03/2000"},
-        {3, 2, 0, {2001, 2, 15}, "", "01/02/2001", "31/03/2001"},
-        {3, 5, 0, {2001, 2, 15}, "", "01/05/2000", "31/03/2001"},
-        {3, 0, 2005, {2001, 8, 15}, "", "01/04/2005", "31/03/2006"},
-        {4, 0, 0, {2001, 8, 15}, "", "01//2001", "01//2001"},
-    };
+        int style, month, year, todayMonth;  // today is the 15th of that month in 2001
+        const char *startBox, *first, *last;
+    } cases[] = {{0, 0, 0, 8, "", "01/08/2001", "31/08/2001"},
+                 {0, 2, 2004, 8, "", "01/02/2004", "29/02/2004"},
+                 {1, 0, 0, 8, "10/02/2000", "01/08/2001", "29/02/2000"},
+                 {2, 0, 0, 8, "10/03/2001", "01/01/2001", "31/12/2001"},
+                 {3, 0, 0, 8, "", "01/04/2001", "31/03/2002"},
+                 {3, 0, 0, 4, "", "01/04/2001", "31/03/2002"},
+                 {3, 0, 0, 3, "", "01/04/2000", "31/03/2001"},
+                 {3, 0, 0, 2, "15/02/2001", "01/04/2000", "31/03/2001"},
+                 {3, 2, 0, 8, "", "01/02/2000", "31/03/2000"},
+                 {3, 2, 0, 2, "", "01/02/2001", "31/03/2001"},
+                 {3, 0, 2005, 8, "", "01/04/2005", "31/03/2006"},
+                 {4, 0, 0, 8, "", "01//2001", "01//2001"}};
     for (const Case& c : cases) {
-        SCOPED_TRACE(std::string(c.first) + " style " + std::to_string(c.style));
         Form f;
-        f.setToday(c.today);
+        f.setToday({2001, c.todayMonth, 15});
         auto& control = f.add<RYXDateRange>("dr");
         control.setDateStyle(c.style);
         control.setMonth(c.month);
         control.setYear(c.year);
         control.setStartDate(c.startBox);
-        EXPECT_EQ(control.d_DefaultDate(0), c.first);
-        EXPECT_EQ(control.d_DefaultDate(1), c.last);
+        EXPECT_EQ(control.d_DefaultDate(0), c.first) << c.style << " " << c.todayMonth;
+        EXPECT_EQ(control.d_DefaultDate(1), c.last) << c.style << " " << c.startBox;
         EXPECT_FALSE(isDate(control.d_DefaultDate(2)));
     }
 }
@@ -251,34 +176,26 @@ TEST_F(DateRangeTest, DefaultDatesFollowTheStyleMonthYearAndToday) {
 TEST_F(DateRangeTest, ReadingFillsBlankDatesThatMayNotBeBlank) {
     struct Case {
         int style, allowBlank;
-        const char* start;
-        const char* end;
-        bool readStart;
-        const char* startAfter;
-        const char* endAfter;
-    } cases[] = {
-        {0, 0, "", "", true, "01/08/2001", kEmpty},
-        {3, 2, "", "", true, "01/04/2001", kEmpty},
-        {0, 1, "", "", true, kEmpty, kEmpty},
-        {0, 0, "", "", false, kEmpty, kEmpty},  // the end needs a start
-        {0, 0, "10/02/2004", "", false, "10/02/2004", "29/02/2004"},
-        {0, 2, "10/02/2004", "", false, "10/02/2004", kEmpty},
-        {1, 0, "15/03/2000", "20/05/2000", false, "15/03/2000", "31/03/2000"},
-        {1, 0, "15/03/2000", "10/03/2000", false, "15/03/2000", "10/03/2000"},  // left
-        {2, 1, "15/03/2000", "10/01/2001", false, "15/03/2000", "31/12/2000"},
-        {3, 0, "15/02/2001", "10/06/2001", false, "15/02/2001", "31/03/2001"},
-        {3, 0, "15/05/2000", "10/02/2001", false, "15/05/2000", "10/02/2001"},
-    };
+        bool readEnd;
+        const char *start, *end, *startAfter, *endAfter;
+    } cases[] = {{0, 0, false, "", "", "01/08/2001", kEmpty},
+                 {3, 2, false, "", "", "01/04/2001", kEmpty},
+                 {0, 1, false, "", "", kEmpty, kEmpty},
+                 {0, 0, true, "", "", kEmpty, kEmpty},  // the end needs a start
+                 {0, 0, true, "10/02/2004", "", "10/02/2004", "29/02/2004"},
+                 {0, 2, true, "10/02/2004", "", "10/02/2004", kEmpty},
+                 {1, 0, true, "15/03/2000", "20/05/2000", "15/03/2000", "31/03/2000"},
+                 {1, 0, true, "15/03/2000", "10/03/2000", "15/03/2000", "10/03/2000"},  // left
+                 {2, 1, true, "15/03/2000", "10/01/2001", "15/03/2000", "31/12/2000"},
+                 {3, 0, true, "15/02/2001", "10/06/2001", "15/02/2001", "31/03/2001"},
+                 {3, 0, true, "15/05/2000", "10/02/2001", "15/05/2000", "10/02/2001"}};
     for (const Case& c : cases) {
-        SCOPED_TRACE(std::string(c.start) + " .. " + c.end);
         setUp(c.style, c.allowBlank, c.start, c.end);
-        (void)(c.readStart ? dr->StartDate() : dr->EndDate());
-        EXPECT_EQ(start->text(), c.startAfter);
-        EXPECT_EQ(end->text(), c.endAfter);
+        (void)(c.readEnd ? dr->EndDate() : dr->StartDate());
+        EXPECT_EQ(start->text(), c.startAfter) << c.start << " .. " << c.end;
+        EXPECT_EQ(end->text(), c.endAfter) << c.start << " .. " << c.end;
     }
 }
-
-// ---- returned dates ------------------------------------------------------------------------
 
 TEST_F(DateRangeTest, DatesComeBackInBothSyntaxesAndBlankAsEmpty) {
     dr->setStartDate("15/08/2001");
@@ -286,19 +203,16 @@ TEST_F(DateRangeTest, DatesComeBackInBothSyntaxesAndBlankAsEmpty) {
     dr->setCrystalStyle(false);
     EXPECT_EQ(dr->StartDate(), Variant("15/08/2001"));
 
-    struct Case {
-        Variant value;
-        const char* box;
-    } cases[] = {{"", kEmpty},
-                 {"hello", kEmpty},
-                 {Variant(), kEmpty},
-                 {"11/11/1111", kEmpty},
-                 {"1 /5 /2000", "01/05/2000"},
-                 {"5-6-01", "05/06/2001"}};
-    for (const Case& c : cases) {
+    std::pair<Variant, const char*> cases[] = {{"", kEmpty},
+                                               {"hello", kEmpty},
+                                               {Variant(), kEmpty},
+                                               {"11/11/1111", kEmpty},
+                                               {"1 /5 /2000", "01/05/2000"},
+                                               {"5-6-01", "05/06/2001"}};
+    for (const auto& [value, box] : cases) {
         site->clearRecords();
-        dr->setEndDate(c.value);
-        EXPECT_EQ(end->text(), c.box);
+        dr->setEndDate(value);
+        EXPECT_EQ(end->text(), box);
         EXPECT_EQ(site->notifications(), std::vector<std::string>{"EndDate"});
     }
     dr->setEndDate("11/11/1111");
@@ -320,61 +234,53 @@ TEST_F(DateRangeTest, ReadingSeesWhatTheUserTypedWithoutLeavingTheBox) {
 TEST_F(DateRangeTest, LeavingTheEndBoxMovesOrClearsTheEnd) {
     struct Case {
         int style, allowBlank;
-        const char* start;
-        const char* end;
-        const char* result;
-    } cases[] = {
-        {0, 0, "15/08/2001", "", "31/08/2001"},
-        {0, 1, "15/02/2004", "", "29/02/2004"},
-        {0, 2, "15/08/2001", "", kEmpty},
-        {0, 3, "15/08/2001", "", kEmpty},
-        {0, 1, "", "10/02/2004", "10/02/2004"},
-        {0, 2, "20/02/2004", "10/02/2004", "29/02/2004"},
-        {0, 0, "20/02/2004", "10/02/2004", kEmpty},
-        {1, 0, "15/03/2000", "20/05/2000", "20/03/2000"},
-        {1, 0, "15/04/2000", "31/05/2000", kEmpty},  // no 31st of April
-        {1, 0, "15/03/2000", "15/03/2000", "15/03/2000"},
-        {1, 0, "15/03/2000", "14/03/2000", kEmpty},
-        {2, 0, "15/11/2000", "10/02/2001", kEmpty},
-        {2, 0, "15/03/2000", "10/05/2001", "10/05/2000"},
-        {2, 0, "15/03/2000", "20/03/2001", "20/03/2000"},
-        {2, 1, "15/03/2000", "10/03/2001", "31/12/2000"},
-        {2, 2, "15/03/2000", "10/03/2001", kEmpty},
-        {3, 0, "15/05/2000", "10/02/2001", "10/02/2001"},
-        {3, 0, "15/05/2000", "10/02/2002", "10/02/2001"},
-        {3, 0, "15/02/2001", "10/06/2001", "10/06/2000"},
-        {3, 0, "15/02/2001", "10/03/2002", "10/03/2001"},
-        {3, 0, "15/05/2000", "10/08/2001", "10/08/2000"},
-        {3, 3, "15/05/2000", "10/05/2001", "31/03/2001"},
-        {3, 0, "15/05/2000", "15/05/2001", "15/05/2000"},
-        {3, 0, "15/05/2000", "20/05/2001", "20/05/2000"},
-        {3, 0, "15/05/2001", "29/02/2004", kEmpty},  // 2002 has no 29th of February
-        {4, 0, "15/05/2000", "15/05/2000", "15/05/2000"},
-        {4, 0, "15/05/2000", "16/05/2000", kEmpty},
-    };
+        const char *start, *end, *result;
+    } cases[] = {{0, 0, "15/08/2001", "", "31/08/2001"},
+                 {0, 1, "15/02/2004", "", "29/02/2004"},
+                 {0, 2, "15/08/2001", "", kEmpty},
+                 {0, 1, "", "10/02/2004", "10/02/2004"},
+                 {0, 2, "20/02/2004", "10/02/2004", "29/02/2004"},
+                 {0, 0, "20/02/2004", "10/02/2004", kEmpty},
+                 {1, 0, "15/03/2000", "20/05/2000", "20/03/2000"},
+                 {1, 0, "15/04/2000", "31/05/2000", kEmpty},  // no 31st of April
+                 {1, 0, "15/03/2000", "14/03/2000", kEmpty},
+                 {2, 0, "15/11/2000", "10/02/2001", kEmpty},
+                 {2, 0, "15/03/2000", "10/05/2001", "10/05/2000"},
+                 {2, 0, "15/03/2000", "20/03/2001", "20/03/2000"},
+                 {2, 1, "15/03/2000", "10/03/2001", "31/12/2000"},
+                 {2, 2, "15/03/2000", "10/03/2001", kEmpty},
+                 {3, 0, "15/05/2000", "10/02/2001", "10/02/2001"},
+                 {3, 0, "15/05/2000", "10/02/2002", "10/02/2001"},
+                 {3, 0, "15/02/2001", "10/06/2001", "10/06/2000"},
+                 {3, 0, "15/02/2001", "10/03/2002", "10/03/2001"},
+                 {3, 0, "15/05/2000", "10/08/2001", "10/08/2000"},
+                 {3, 3, "15/05/2000", "10/05/2001", "31/03/2001"},
+                 {3, 0, "15/05/2000", "15/05/2001", "15/05/2000"},
+                 {3, 0, "15/05/2000", "20/05/2001", "20/05/2000"},
+                 {3, 0, "15/05/2001", "29/02/2004", kEmpty},  // 2002 has no 29th of February
+                 {4, 0, "15/05/2000", "15/05/2000", "15/05/2000"},
+                 {4, 0, "15/05/2000", "16/05/2000", kEmpty},
+                 {0, 0, "10/02/2004", "20/03/2005", nullptr}};  // not touched
     for (const Case& c : cases) {
-        SCOPED_TRACE(std::to_string(c.style) + ": " + c.start + " .. " + c.end);
-        leaveEndBox(c.style, c.allowBlank, c.start, c.end);
-        EXPECT_EQ(end->text(), c.result);
-        EXPECT_EQ(site->notifications(), std::vector<std::string>{"EndDate"});
+        form.setFocus(*end);
+        setUp(c.style, c.allowBlank, c.start, c.end);
+        site->clearRecords();
+        form.setFocus(*start);  // the end box's own rules, without leaving the control
+        EXPECT_EQ(end->text(), c.result ? c.result : c.end) << c.start << " .. " << c.end;
+        EXPECT_EQ(site->notifications().size(), c.result ? 1u : 0u);
     }
-    leaveEndBox(0, 0, "10/02/2004", "20/03/2005");  // an end after the start: not touched
-    EXPECT_TRUE(site->notifications().empty());
 }
 
 TEST_F(DateRangeTest, LeavingTheStartBoxTidiesItOrFillsItOrClearsIt) {
     struct Case {
         int style, allowBlank;
-        const char* typed;
-        const char* result;
-    } cases[] = {
-        {0, 0, "150801", "15/08/2001"},
-        {0, 0, "", "01/08/2001"},
-        {3, 2, "", "01/04/2001"},
-        {0, 1, "", kEmpty},
-        {0, 3, "1", kEmpty},
-        {4, 0, "", kEmpty},
-    };
+        const char *typed, *result;
+    } cases[] = {{0, 0, "150801", "15/08/2001"},
+                 {0, 0, "", "01/08/2001"},
+                 {3, 2, "", "01/04/2001"},
+                 {0, 1, "", kEmpty},
+                 {0, 3, "1", kEmpty},
+                 {4, 0, "", kEmpty}};
     for (const Case& c : cases) {
         setUp(c.style, c.allowBlank, "", "");
         typeInto(*start, c.typed);
@@ -386,7 +292,6 @@ TEST_F(DateRangeTest, LeavingTheStartBoxTidiesItOrFillsItOrClearsIt) {
 TEST_F(DateRangeTest, LeavingTheControlChecksBothDates) {
     form.setFocus(*start);
     form.setFocus(*after);  // straight from the start box: the end is filled too
-    EXPECT_EQ(start->text(), "01/08/2001");
     EXPECT_EQ(end->text(), "31/08/2001");
 
     dr->setDateStyle(3);
@@ -394,9 +299,8 @@ TEST_F(DateRangeTest, LeavingTheControlChecksBothDates) {
     typeInto(*start, "15/5/2001");
     form.keys("{TAB}10022003{TAB}");
     EXPECT_EQ(form.focused(), after);
-    EXPECT_EQ(end->text(), "10/02/2002");  // into the start's financial year
     EXPECT_EQ(dr->StartDate(), Variant("Date( 2001,05,15)"));
-    EXPECT_EQ(dr->EndDate(), Variant("Date( 2002,02,10)"));
+    EXPECT_EQ(dr->EndDate(), Variant("Date( 2002,02,10)"));  // in the start's financial year
 }
 
 TEST_F(DateRangeTest, NoRuleRunsWhileLockedDisabledOrAfterACalendarClick) {
@@ -417,64 +321,50 @@ TEST_F(DateRangeTest, NoRuleRunsWhileLockedDisabledOrAfterACalendarClick) {
 }
 
 TEST_F(DateRangeTest, CalendarImagesRaiseButtonClick) {
-    auto& image = site->child<HImage>("ImgCalendar", 1);
-    form.click(image);
-    form.click(image);
+    form.click(image(1));
+    form.click(image(1));
     EXPECT_TRUE(dr->ImageClick);
     ASSERT_EQ(countEvents(form, "dr", EventId::ButtonClick), 2);
     EXPECT_EQ(form.events().back().args.Index, Variant(int16_t{1}));
-    EXPECT_TRUE(dr->EndDate().isEmpty());  // no fill while the host answers the click
+    EXPECT_TRUE(dr->StartDate().isEmpty());  // no fill while the host answers the click
     dr->ImageClick = false;
-    EXPECT_EQ(dr->EndDate(), Variant());  // no start: still nothing to fill from
     EXPECT_EQ(dr->StartDate(), Variant("Date( 2001,08,01)"));
 }
 
 // ---- typing --------------------------------------------------------------------------------
 
 TEST_F(DateRangeTest, SlashCompletesTheDayOrMonthAndTypingOverwrites) {
-    struct Case {
-        const char* typed;
-        const char* text;
-    } cases[] = {
-        {"1/5/2000", "01/05/2000"},
-        {"15/05/2000", "15/05/2000"},
-        {"15052000", "15/05/2000"},
-        {"/", "01/__/____"},
-        {"45/", kEmpty},
-        {"12/13/", "12/__/____"},
-        {"15/05/20/01", "15/05/2001"},
-        {"3/11/", "03/11/____"},
-    };
-    for (const Case& c : cases) {
-        dr->setStartDate("");
-        typeInto(*start, c.typed);
-        EXPECT_EQ(start->text(), c.text) << c.typed;
+    const char* cases[][3] = {{"", "1/5/2000", "01/05/2000"},
+                              {"", "15/05/2000", "15/05/2000"},
+                              {"", "15052000", "15/05/2000"},
+                              {"", "/", "01/__/____"},
+                              {"", "45/", kEmpty},
+                              {"", "12/13/", "12/__/____"},
+                              {"", "15/05/20/01", "15/05/2001"},
+                              {"", "3/11/", "03/11/____"},
+                              {"28/02/2001", "10", "10/02/2001"}};
+    for (auto [old, typed, text] : cases) {
+        dr->setStartDate(old);
+        typeInto(*start, typed);
+        EXPECT_EQ(start->text(), text) << typed;
     }
-    dr->setStartDate("28/02/2001");
-    typeInto(*start, "10");  // digits replace digits
-    EXPECT_EQ(start->text(), "10/02/2001");
 }
 
 TEST_F(DateRangeTest, EnterStaysAndArrowsMoveTheFocus) {
     form.setFocus(*end);
     form.press(vk::Return);
     EXPECT_EQ(form.focused(), end);
-    ASSERT_EQ(countEvents(form, "dr", EventId::KeyPress), 1);
-    EXPECT_EQ(form.events()[1].args.KeyAscii, 13);
+    ASSERT_EQ(ryx::testing::eventNumbers(form, "dr"), (std::vector<int>{4, 5}));
+    EXPECT_EQ(form.events()[1].args.KeyAscii, 13);  // the host sees the Enter first
     EXPECT_EQ(form.events()[1].args.Index, Variant(int16_t{1}));
-    EXPECT_EQ(countEvents(form, "dr", EventId::KeyUp), 0);
 
     form.press(vk::Up);
-    EXPECT_EQ(form.focused(), start);
-    form.press(vk::Left);
     EXPECT_EQ(form.focused(), start);
     form.press(vk::Up);
     EXPECT_EQ(form.focused(), before);
     form.setFocus(*start);
-    form.press(vk::Down);
-    form.press(vk::Down);
+    form.keys("{DOWN}{DOWN}");
     EXPECT_EQ(form.focused(), after);
-
     form.focusControl(*site);  // Enter on the surface moves on
     form.press(vk::Return);
     EXPECT_EQ(form.focused(), after);
@@ -498,7 +388,6 @@ TEST_F(DateRangeTest, TheHostSeesEachKeyFirstAndMayChangeIt) {
 TEST_F(DateRangeTest, ControlKeysActOnTheWholeSelection) {
     dr->setStartDate("15/08/2001");
     form.setFocus(*start);
-    start->setSelStart(0);
     start->setSelLength(10);
     form.press('X', shift::Ctrl);
     EXPECT_EQ(start->text(), kEmpty);

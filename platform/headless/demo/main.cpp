@@ -11,6 +11,7 @@ int main() {
     form.setUserMode(true);
 
     demo::policyStatus(form);
+    demo::dateRange(form);
     demo::rangeSelector(form);
 
     const auto file = std::filesystem::temp_directory_path() / "ryx-demo-form.json";

@@ -1,6 +1,7 @@
 // The control types a form file may name, and how to create each.
 #include "control_types.h"
 
+#include "ryx/date_range.h"
 #include "ryx/policy_status.h"
 #include "ryx/range_selector.h"
 
@@ -19,6 +20,7 @@ struct ControlType {
 
 constexpr ControlType kControlTypes[] = {
     {"RYXPolicyStatus", &make<RYXPolicyStatus>},
+    {"RYXDateRange", &make<RYXDateRange>},
     {"RYXRangeSelector", &make<RYXRangeSelector>},
 };
 

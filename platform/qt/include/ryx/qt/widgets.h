@@ -2,6 +2,7 @@
 // at the control's design size. Events arrive as the signals of ControlHost.
 #pragma once
 
+#include "ryx/date_range.h"
 #include "ryx/policy_status.h"
 #include "ryx/qt/control_host.h"
 #include "ryx/range_selector.h"
@@ -12,6 +13,12 @@ class PolicyStatusWidget : public ControlWidget<RYXPolicyStatus> {
   public:
     explicit PolicyStatusWidget(QWidget* parent = nullptr, bool newInstance = true)
         : ControlWidget(parent, 2905, 1580, newInstance) {}
+};
+
+class DateRangeWidget : public ControlWidget<RYXDateRange> {
+  public:
+    explicit DateRangeWidget(QWidget* parent = nullptr, bool newInstance = true)
+        : ControlWidget(parent, 2430, 1305, newInstance) {}
 };
 
 class RangeSelectorWidget : public ControlWidget<RYXRangeSelector> {

@@ -1,6 +1,7 @@
 // The control types a form file may name, and how to create each.
 #include "control_types.h"
 
+#include "ryx/agency_selection.h"
 #include "ryx/policy_status.h"
 
 namespace ryx::headless {
@@ -18,6 +19,7 @@ struct ControlType {
 
 constexpr ControlType kControlTypes[] = {
     {"RYXPolicyStatus", &make<RYXPolicyStatus>},
+    {"RYXAgencySelection", &make<RYXAgencySelection>},
 };
 
 }  // namespace

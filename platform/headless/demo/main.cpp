@@ -11,6 +11,7 @@ int main() {
     form.setUserMode(true);
 
     demo::policyStatus(form);
+    demo::agencySelection(form);
 
     const auto file = std::filesystem::temp_directory_path() / "ryx-demo-form.json";
     ryx::headless::saveForm(form, file);

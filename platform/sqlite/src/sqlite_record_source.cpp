@@ -66,9 +66,9 @@ void SqliteRecordSource::refresh() {
     records_.reset();
     if (database_.empty())
         throw DataSourceError("cannot open the agency database: no database name is set");
-    if (database_.find('\0') != std::string::npos)
-        throw DataSourceError("cannot open the agency database \"" + database_ +
-                              "\": the name holds a NUL character");
+    if (const size_t nul = database_.find('\0'); nul != std::string::npos)
+        throw DataSourceError("cannot open the agency database \"" + database_.substr(0, nul) +
+                              "\\0...\": the name holds a NUL character");
 
     sqlite3* raw = nullptr;
     const int opened = sqlite3_open_v2(fileUri(database_).c_str(), &raw,

@@ -1,5 +1,7 @@
 #include "ryx/agency_selection.h"
 
+#include <algorithm>
+
 namespace ryx {
 namespace {
 
@@ -73,10 +75,15 @@ constexpr WidgetDesign kButton{.kind = WidgetKind::CommandButton,
 // and turn the rest of itself into formula text.
 void appendQuoted(std::string& text, std::string_view code) {
     text += '"';
-    for (char c : code) {
-        if (c == '"') text += '"';
-        text += c;
+    auto quote = [](char c) { return c == '"'; };
+    for (auto at = std::find_if(code.begin(), code.end(), quote); at != code.end();
+         at = std::find_if(code.begin(), code.end(), quote)) {
+        const auto length = static_cast<size_t>(at - code.begin()) + 1;
+        text.append(code.substr(0, length));
+        text += '"';
+        code.remove_prefix(length);
     }
+    text.append(code);
     text += '"';
 }
 

@@ -14,11 +14,13 @@ void SnapshotRecordSet::append(std::string_view text) {
     text_ += text;
     ends_.push_back(text_.size());
     null_.push_back(false);
+    valueAdded();
 }
 
 void SnapshotRecordSet::appendNull() {
     ends_.push_back(text_.size());
     null_.push_back(true);
+    valueAdded();
 }
 
 void SnapshotRecordSet::moveNext() {
@@ -28,7 +30,8 @@ void SnapshotRecordSet::moveNext() {
 
 std::optional<std::string> SnapshotRecordSet::field(std::string_view name) const {
     for (size_t column = 0; column < columns_.size(); ++column)
-        if (keysEqual(columns_[column], name)) return field(static_cast<int>(column));
+        if (columns_[column] == name || keysEqual(columns_[column], name))
+            return field(static_cast<int>(column));
     fail("the query gives no field named \"" + std::string(name) + "\"");
 }
 
@@ -40,7 +43,7 @@ std::optional<std::string> SnapshotRecordSet::field(int position) const {
     const size_t cell = position_ * columns_.size() + static_cast<size_t>(position);
     if (null_[cell]) return std::nullopt;
     const size_t begin = cell == 0 ? 0 : ends_[cell - 1];
-    return text_.substr(begin, ends_[cell] - begin);
+    return std::string(text_.data() + begin, ends_[cell] - begin);
 }
 
 void SnapshotRecordSet::fail(const std::string& what) const {

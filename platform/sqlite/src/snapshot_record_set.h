@@ -23,10 +23,10 @@ class SnapshotRecordSet : public RecordSet {
     // Appends the next value of the record being built, in column order.
     void append(std::string_view text);
     void appendNull();
-    size_t recordCount() const { return ends_.size() / columns_.size(); }
+    size_t recordCount() const { return records_; }
 
-    bool eof() const override { return position_ >= recordCount(); }
-    bool bof() const override { return recordCount() == 0; }
+    bool eof() const override { return position_ >= records_; }
+    bool bof() const override { return records_ == 0; }
     void moveFirst() override { position_ = 0; }
     void moveNext() override;
     // Names match without regard to letter case, as the database's own column names do.
@@ -34,6 +34,12 @@ class SnapshotRecordSet : public RecordSet {
     std::optional<std::string> field(int position) const override;
 
   private:
+    void valueAdded() {
+        if (++column_ == columns_.size()) {
+            column_ = 0;
+            ++records_;
+        }
+    }
     [[noreturn]] void fail(const std::string& what) const;
 
     std::vector<std::string> columns_;
@@ -41,6 +47,8 @@ class SnapshotRecordSet : public RecordSet {
     std::string text_;
     std::vector<size_t> ends_;  // where each value ends in text_
     std::vector<bool> null_;
+    size_t column_ = 0;   // of the record being built
+    size_t records_ = 0;  // complete records
     size_t position_ = 0;
 };
 

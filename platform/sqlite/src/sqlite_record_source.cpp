@@ -71,8 +71,10 @@ void SqliteRecordSource::refresh() {
                               "\\0...\": the name holds a NUL character");
 
     sqlite3* raw = nullptr;
-    const int opened = sqlite3_open_v2(fileUri(database_).c_str(), &raw,
-                                       SQLITE_OPEN_READONLY | SQLITE_OPEN_URI, nullptr);
+    const int opened = sqlite3_open_v2(
+        fileUri(database_).c_str(), &raw,
+        SQLITE_OPEN_READONLY | SQLITE_OPEN_URI | SQLITE_OPEN_NOMUTEX,  // used by this call alone
+        nullptr);
     Database db(raw);
     if (opened != SQLITE_OK) fail(database_, "open", db.get());
     sqlite3_busy_timeout(db.get(), kBusyWaitMs);

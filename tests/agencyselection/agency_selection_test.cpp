@@ -280,6 +280,10 @@ TEST_F(AgencySelectionTest, LayoutAtCreationAndOnResize) {
     form.create("RYXAgencySelection", "fresh");
     EXPECT_EQ(form.site("fresh").child<HListBox>("LstAgMast").heightSize(), 900);
     EXPECT_EQ(form.site("fresh").child<HCommandButton>("cmdDeselect").left(), 1455);
+    form.site("fresh").control().InitProperties();
+    EXPECT_EQ(form.site("fresh").child<HListBox>("LstAgMast").widthSize(), 3000 - 150);
+    EXPECT_EQ(form.site("fresh").notifications(),
+              (std::vector<std::string>{"CrystalStyle", "Enabled", "Locked"}));
     struct Case {
         Twips width, controlWidth, listWidth, buttonLeft;
     } cases[] = {{1000, 2820, 2460, 1555}, {4000, 4000, 3640, 2735}};
@@ -312,7 +316,8 @@ TEST_F(AgencySelectionTest, ColoursAndEveryKeySurviveSaveAndReload) {
                                         "CrystalStyle", "Locked", "Enabled"}));
 
     Form loaded;
-    loadFormJson(loaded, formToJson(form), "saved");
+    saveForm(form, tmp / "form.json");
+    loadForm(loaded, tmp / "form.json");
     auto& again = dynamic_cast<RYXAgencySelection&>(loaded.site("ag").control());
     EXPECT_EQ(again.ForeColor(), Color(0x80000005));
     EXPECT_EQ(again.ButtonBackColor(), 0x000102);  // not the colour ForeColor gave it

@@ -16,5 +16,6 @@ inline void show(const std::string& what, const std::string& value) {
 void policyStatus(ryx::headless::Form& form);
 void dateRange(ryx::headless::Form& form);
 void rangeSelector(ryx::headless::Form& form);
+void agencySelection(ryx::headless::Form& form);
 
 }  // namespace demo

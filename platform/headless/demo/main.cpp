@@ -13,6 +13,7 @@ int main() {
     demo::policyStatus(form);
     demo::dateRange(form);
     demo::rangeSelector(form);
+    demo::agencySelection(form);
 
     const auto file = std::filesystem::temp_directory_path() / "ryx-demo-form.json";
     ryx::headless::saveForm(form, file);

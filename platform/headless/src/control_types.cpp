@@ -2,6 +2,7 @@
 #include "control_types.h"
 
 #include "ryx/date_range.h"
+#include "ryx/agency_selection.h"
 #include "ryx/policy_status.h"
 #include "ryx/range_selector.h"
 
@@ -22,6 +23,7 @@ constexpr ControlType kControlTypes[] = {
     {"RYXPolicyStatus", &make<RYXPolicyStatus>},
     {"RYXDateRange", &make<RYXDateRange>},
     {"RYXRangeSelector", &make<RYXRangeSelector>},
+    {"RYXAgencySelection", &make<RYXAgencySelection>},
 };
 
 }  // namespace

@@ -4,20 +4,20 @@
 # criteria that the demo prints.
 #   scripts/e2e.sh path/to/ryx-demo
 set -euo pipefail
-demo="$(realpath "$1")"
-out="$(mktemp)"
-trap 'rm -f "$out"' EXIT
 
-run() {
+# Inside the X server: start the demo, type, quit.
+if [ "${1:-}" = "--inside" ]; then
+  demo="$2"
+  out="$3"
   QT_QPA_PLATFORM=xcb "$demo" --print-on-exit >"$out" 2>/dev/null &
-  local pid=$!
-  local win=""
+  pid=$!
+  win=""
   for _ in $(seq 1 100); do
     win="$(xdotool search --name "RYXReport demo" 2>/dev/null | head -n 1 || true)"
     [ -n "$win" ] && break
     sleep 0.1
   done
-  [ -n "$win" ] || { echo "the demo window did not appear"; kill "$pid"; return 1; }
+  [ -n "$win" ] || { echo "the demo window did not appear"; kill "$pid"; exit 1; }
   xdotool windowactivate --sync "$win" 2>/dev/null || xdotool windowfocus --sync "$win"
   sleep 0.5
   # The focus starts in the start date: type a period in one financial year and leave it.
@@ -28,11 +28,13 @@ run() {
   sleep 0.3
   xdotool key --delay 40 ctrl+q
   wait "$pid"
-}
+  exit 0
+fi
 
-export -f run
-export demo out
-xvfb-run -a -s "-screen 0 1280x800x24" bash -c run
+demo="$(realpath "$1")"
+out="$(mktemp)"
+trap 'rm -f "$out"' EXIT
+xvfb-run -a -s "-screen 0 1280x800x24" "$0" --inside "$demo" "$out"
 cat "$out"
 grep -q "Date( 2001,05,15)" "$out"
 grep -q "Date( 2002,02,10)" "$out"

@@ -25,15 +25,19 @@ namespace {
 // The policy numbers the host offers when the range selector asks for its list.
 QStringList policyNumbers() {
     QStringList numbers;
-    for (int i = 0; i < 40; ++i) numbers << QString::number(1000100 + i * 25);
+    for (int i = 0; i < 40; ++i)
+        numbers << QString::number(1000100 + i * 25);
     return numbers;
 }
 
-QString text(const std::string& s) { return QString::fromStdString(s); }
+QString text(const std::string& s) {
+    return QString::fromStdString(s);
+}
 
-QString quoted(const Variant& v) {
+// A Variant as the host sees it: its text, or (empty) for no value at all.
+QString shown(const Variant& v) {
     if (v.isEmpty()) return "(empty)";
-    return text(v.toString());
+    return "\"" + text(v.toString()) + "\"";
 }
 
 QLabel* caption(const QString& what) {
@@ -89,11 +93,10 @@ DemoWindow::DemoWindow(const QString& databasePath, QWidget* parent) : QMainWind
         statusBar()->showMessage(QString::fromStdString(e.what()));
     }
 
-    for (ControlHost* host : std::initializer_list<ControlHost*>{
-             policyStatus_, agencies_, dateRange_, rangeSelector_}) {
-        connect(host, &ControlHost::eventRaised, this, [this](int, EventArgs&) {
-            scheduleRefresh();
-        });
+    for (ControlHost* host : std::initializer_list<ControlHost*>{policyStatus_, agencies_,
+                                                                 dateRange_, rangeSelector_}) {
+        connect(host, &ControlHost::eventRaised, this,
+                [this](int, EventArgs&) { scheduleRefresh(); });
     }
     connect(dateRange_, &ControlHost::ButtonClick, this, [this](EventArgs& a) { pickDate(a); });
     connect(rangeSelector_, &ControlHost::ButtonClick, this,
@@ -152,13 +155,13 @@ QString DemoWindow::criteria() {
     RYXPolicyStatus& ps = policyStatus_->control();
     auto [psFormula, psPlain] = bothSyntaxes(ps, [&] { return text(ps.ReturnedText()); });
     line("Policy status ReturnedText", psFormula, psPlain);
-    out += "  DefaultSetting: \"" + quoted(ps.DefaultSetting()) + "\"\n";
+    out += "  DefaultSetting: " + shown(ps.DefaultSetting()) + "\n";
 
     RYXAgencySelection& ag = agencies_->control();
     try {
         auto [agFormula, agPlain] = bothSyntaxes(ag, [&] { return text(ag.ReturnedText()); });
         line("Agencies ReturnedText", agFormula, agPlain);
-        out += "  DefaultSetting: \"" + quoted(ag.DefaultSetting()) + "\"\n";
+        out += "  DefaultSetting: " + shown(ag.DefaultSetting()) + "\n";
     } catch (const ryx::Error& e) {
         out += "Agencies: " + text(e.what()) + "\n";
     }
@@ -167,8 +170,8 @@ QString DemoWindow::criteria() {
     if (editingDates()) {
         out += "Date range StartDate, EndDate\n  (read when the focus leaves the dates)\n";
     } else {
-        auto [start, startPlain] = bothSyntaxes(dr, [&] { return quoted(dr.StartDate()); });
-        auto [end, endPlain] = bothSyntaxes(dr, [&] { return quoted(dr.EndDate()); });
+        auto [start, startPlain] = bothSyntaxes(dr, [&] { return shown(dr.StartDate()); });
+        auto [end, endPlain] = bothSyntaxes(dr, [&] { return shown(dr.EndDate()); });
         line("Date range StartDate", start, startPlain);
         line("Date range EndDate", end, endPlain);
     }
@@ -237,8 +240,8 @@ void DemoWindow::saveForm(const QString& path) {
 void DemoWindow::loadForm(const QString& path) {
     const std::string file = path.toStdString();
     for (common::FormEntry& entry : common::parseForm(common::readFormFile(file), file)) {
-        for (ControlHost* host : std::initializer_list<ControlHost*>{
-                 policyStatus_, agencies_, dateRange_, rangeSelector_}) {
+        for (ControlHost* host : std::initializer_list<ControlHost*>{policyStatus_, agencies_,
+                                                                     dateRange_, rangeSelector_}) {
             if (host->objectName().toStdString() != entry.name) continue;
             if (host->hostedControl().typeName() != entry.type) continue;
             host->hostedControl().ReadProperties(entry.properties);

@@ -11,7 +11,7 @@
 
 class DemoWindow : public QMainWindow {
     Q_OBJECT
-public:
+  public:
     explicit DemoWindow(const QString& databasePath, QWidget* parent = nullptr);
 
     ryx::qt::PolicyStatusWidget& policyStatus() const { return *policyStatus_; }
@@ -24,10 +24,10 @@ public:
     void saveForm(const QString& path);
     void loadForm(const QString& path);
 
-signals:
+  signals:
     void criteriaShown(const QString& text);
 
-private:
+  private:
     void buildMenu();
     void scheduleRefresh();
     void refreshCriteria();

@@ -18,6 +18,12 @@
 
 namespace {
 
+// The offscreen platform warns about what it cannot do for a window; the session needs none of it.
+void quietOffscreenWarnings(QtMsgType type, const QMessageLogContext&, const QString& message) {
+    if (message.contains("propagateSizeHints") || message.contains("XDG_RUNTIME_DIR")) return;
+    std::cerr << (type == QtWarningMsg ? "warning: " : "") << message.toStdString() << "\n";
+}
+
 bool haveDisplay() {
     return !qEnvironmentVariableIsEmpty("DISPLAY") ||
            !qEnvironmentVariableIsEmpty("WAYLAND_DISPLAY");
@@ -33,6 +39,7 @@ int main(int argc, char** argv) {
         qputenv("QT_QPA_PLATFORM", "offscreen");
         script = true;
     }
+    if (script) qInstallMessageHandler(quietOffscreenWarnings);
 
     QApplication app(argc, argv);
     QApplication::setApplicationName("ryx-demo");

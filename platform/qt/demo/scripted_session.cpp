@@ -9,7 +9,9 @@
 
 namespace {
 
-void say(const std::string& what) { std::cout << what << "\n"; }
+void say(const std::string& what) {
+    std::cout << what << "\n";
+}
 
 void clickRow(QWidget* list, int row) {
     auto* view = qobject_cast<QListView*>(list);
@@ -28,7 +30,7 @@ void typeInto(QWidget* w, const char* keys) {
 
 int runScriptedSession(DemoWindow& window, const QString& screenshot) {
     window.activateWindow();
-    QTest::qWaitForWindowExposed(&window);
+    if (!QTest::qWaitForWindowActive(&window)) std::cerr << "the window did not become active\n";
 
     say("The user picks \"In - Force\" and \"Fully PaidUp\"");
     QWidget* statuses = window.policyStatus().childWidget("LstPolicyStatus");
@@ -48,7 +50,9 @@ int runScriptedSession(DemoWindow& window, const QString& screenshot) {
     QTest::keyClick(QApplication::focusWidget(), Qt::Key_Tab);
 
     say("The user types policy numbers 1000100, Enter, 1000500");
-    typeInto(window.rangeSelector().childWidget("RYXT", 0), "1000100\r1000500");
+    typeInto(window.rangeSelector().childWidget("RYXT", 0), "1000100");
+    QTest::keyClick(QApplication::focusWidget(), Qt::Key_Return);
+    QTest::keyClicks(QApplication::focusWidget(), "1000500");
     window.policyStatus().childWidget("LstPolicyStatus")->setFocus();
     QApplication::processEvents();
 

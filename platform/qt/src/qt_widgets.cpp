@@ -84,7 +84,7 @@ void setRoleColor(QWidget* w, QPalette::ColorRole role, Color c) {
 QFont toQFont(const Font& f) {
     // The design's Windows fonts map to the nearest fonts of a Linux desktop.
     QFont font(f.name == "Fixedsys" ? "DejaVu Sans Mono" : "DejaVu Sans");
-    font.setPointSizeF(f.name == "Fixedsys" ? 8.5 : f.size * 0.95);
+    font.setPointSizeF(f.name == "Fixedsys" ? 8.5 : f.size * 0.88);
     font.setBold(f.bold);
     return font;
 }
@@ -326,6 +326,7 @@ void RowsModel::announce() {
 QtListBox::QtListBox(ControlHost& host, const WidgetDesign& d, QWidget* parent)
     : QtWidgetOf(host, d, new QListView(parent)), back_(d.backColor), fore_(d.foreColor) {
     view()->setUniformItemSizes(true);
+    view()->setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
     view()->setSelectionMode(QAbstractItemView::NoSelection);
     view()->setEditTriggers(QAbstractItemView::NoEditTriggers);
     view()->setModel(&model_);

@@ -2,6 +2,7 @@
 // at the control's design size. Events arrive as the signals of ControlHost.
 #pragma once
 
+#include "ryx/agency_selection.h"
 #include "ryx/date_range.h"
 #include "ryx/policy_status.h"
 #include "ryx/qt/control_host.h"
@@ -13,6 +14,12 @@ class PolicyStatusWidget : public ControlWidget<RYXPolicyStatus> {
   public:
     explicit PolicyStatusWidget(QWidget* parent = nullptr, bool newInstance = true)
         : ControlWidget(parent, 2905, 1580, newInstance) {}
+};
+
+class AgencySelectionWidget : public ControlWidget<RYXAgencySelection> {
+public:
+    explicit AgencySelectionWidget(QWidget* parent = nullptr, bool newInstance = true)
+        : ControlWidget(parent, 2820, 1740, newInstance) {}
 };
 
 class DateRangeWidget : public ControlWidget<RYXDateRange> {

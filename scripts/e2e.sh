@@ -9,7 +9,7 @@ set -euo pipefail
 if [ "${1:-}" = "--inside" ]; then
   demo="$2"
   out="$3"
-  QT_QPA_PLATFORM=xcb "$demo" --print-on-exit >"$out" 2>/dev/null &
+  QT_QPA_PLATFORM=xcb "$demo" --print-on-exit >"$out" 2>"$out.err" &
   pid=$!
   win=""
   for _ in $(seq 1 100); do
@@ -33,9 +33,10 @@ fi
 
 demo="$(realpath "$1")"
 out="$(mktemp)"
-trap 'rm -f "$out"' EXIT
+trap 'rm -f "$out" "$out.err"' EXIT
 xvfb-run -a -s "-screen 0 1280x800x24" "$0" --inside "$demo" "$out"
 cat "$out"
+if [ -s "$out.err" ] && grep -q "ERROR" "$out.err"; then cat "$out.err"; exit 1; fi
 grep -q "Date( 2001,05,15)" "$out"
 grep -q "Date( 2002,02,10)" "$out"
 echo "e2e: the typed period reached the criteria"

@@ -106,6 +106,11 @@ DemoWindow::DemoWindow(const QString& databasePath, QWidget* parent) : QMainWind
     refreshCriteria();
 }
 
+DemoWindow::~DemoWindow() {
+    // Focus changes while the widgets go must not reach a window that is half destroyed.
+    disconnect(qApp, nullptr, this, nullptr);
+}
+
 void DemoWindow::buildMenu() {
     QMenu* file = menuBar()->addMenu("&Form");
     file->addAction("&Open form file...", QKeySequence::Open, this, [this] { chooseAndLoad(); });

@@ -13,6 +13,7 @@ class DemoWindow : public QMainWindow {
     Q_OBJECT
   public:
     explicit DemoWindow(const QString& databasePath, QWidget* parent = nullptr);
+    ~DemoWindow() override;
 
     ryx::qt::PolicyStatusWidget& policyStatus() const { return *policyStatus_; }
     ryx::qt::AgencySelectionWidget& agencies() const { return *agencies_; }

@@ -88,6 +88,8 @@ ControlHost::ControlHost(QWidget* parent) : QWidget(parent) {
 }
 
 ControlHost::~ControlHost() {
+    // Focus changes while the widgets go must not reach a host that is half destroyed.
+    disconnect(qApp, nullptr, this, nullptr);
     // The control goes first: it may still hold its children.
     control_.reset();
 }

@@ -49,6 +49,20 @@ TEST_F(AgencyWidgetTest, BoxesRowsAndDeselectAllGiveTheHeadlessCriteria) {
     EXPECT_EQ(ag.control().ReturnedText(), "C3");
 }
 
+TEST_F(AgencyWidgetTest, TheFrameAccessKeyPutsTheFocusInTheList) {
+    ryx::testing::QtWindow w;
+    auto& ag = w.add<AgencySelectionWidget>();
+    w.finish();
+    w.before->setFocus();
+    QTest::keyClick(&w.window(), Qt::Key_A, Qt::AltModifier);
+    EXPECT_EQ(w.focusName(), "LstAgMast");
+
+    w.before->setFocus();
+    ag.control().setLocked(true);
+    QTest::keyClick(&w.window(), Qt::Key_A, Qt::AltModifier);
+    EXPECT_EQ(w.focusName(), "before");
+}
+
 // A million agencies reach the Qt list, and selecting them all stays a single pass.
 TEST_F(AgencyWidgetTest, AMillionAgenciesFillTheListAndSelect) {
     const auto db = tmp / "big.db";

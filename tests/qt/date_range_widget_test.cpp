@@ -71,3 +71,21 @@ TEST(DateRangeWidget, TheYearFieldTakesNoSlash) {
     EXPECT_EQ(boxText(dr, 0).toStdString(), "15/05/2___");
     EXPECT_EQ(static_cast<QLineEdit*>(start)->cursorPosition(), 7);
 }
+
+TEST(DateRangeWidget, CalendarImagesAskTheHostUnlessLocked) {
+    ryx::testing::QtWindow w;
+    auto& dr = w.add<DateRangeWidget>();
+    w.finish();
+    std::vector<int> asked;
+    QObject::connect(&dr, &ControlHost::ButtonClick,
+                     [&](EventArgs& a) { asked.push_back(a.Index.toInt32()); });
+    QTest::mouseClick(dr.childWidget("ImgCalendar", 1), Qt::LeftButton);
+    EXPECT_EQ(asked, std::vector<int>{1});
+    EXPECT_TRUE(dr.control().ImageClick);
+
+    dr.control().ImageClick = false;
+    dr.control().setLocked(true);
+    QTest::mouseClick(dr.childWidget("ImgCalendar", 0), Qt::LeftButton);
+    EXPECT_EQ(asked, std::vector<int>{1});
+    EXPECT_FALSE(dr.control().ImageClick);
+}

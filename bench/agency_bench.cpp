@@ -2,6 +2,7 @@
 // building the criterion text, and selecting every row.
 #include <sqlite3.h>
 
+#include <algorithm>
 #include <map>
 #include <memory>
 
@@ -145,8 +146,7 @@ void selectAgency(benchmark::State& state, const AgencyTable& table) {
 void selectFlags(benchmark::State& state, const AgencyTable& table) {
     std::vector<uint8_t> flags(table.rows + 1);
     for (auto _ : state) {
-        for (uint8_t& flag : flags)
-            flag = 1;
+        std::fill(flags.begin(), flags.end(), uint8_t{1});
         flags[1] = 0;
         benchmark::DoNotOptimize(flags.data());
         benchmark::ClobberMemory();

@@ -189,6 +189,23 @@ class ListBox : public Widget {
     // Sets the flag of every row from `first` to `last` inclusive; one Click at most.
     virtual void setSelectedRange(int32_t first, int32_t last, bool v) = 0;
     virtual void setListIndex(int32_t row) = 0;  // the current row
+    // The selected flags of every row at once, one byte a row (1 selected, 0 not), for reading
+    // a long list in one pass; valid until the rows or their flags change.
+    virtual std::span<const uint8_t> selectedFlags() const = 0;
+
+    // Appends `count` rows whose texts the list asks of `text` (with 0 for the first of them)
+    // whenever it needs one, instead of holding a copy of each. `text` must stay callable and
+    // give the same texts until the list is cleared. The default asks once per row and adds a
+    // copy of each text.
+    using RowText = std::function<void(int32_t row, std::string& text)>;
+    virtual void addRows(int32_t count, RowText text) {
+        std::string row;
+        for (int32_t i = 0; i < count; ++i) {
+            row.clear();
+            text(i, row);
+            addItem(row);
+        }
+    }
     virtual Color backColor() const = 0;
     virtual void setBackColor(Color c) = 0;
     virtual Color foreColor() const = 0;  // the text colour

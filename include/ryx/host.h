@@ -309,6 +309,13 @@ class RecordSet {
     // The current record's value; std::nullopt for a null value.
     virtual std::optional<std::string> field(std::string_view name) const = 0;
     virtual std::optional<std::string> field(int position) const = 0;
+
+    // Reading without moving or copying: every record set of the agency source is a snapshot
+    // held in memory. The number of records, and a field of any record by position as a view
+    // that stays valid until the source is refreshed again; std::nullopt for a null value.
+    // DataSourceError for a record or a position out of range.
+    virtual size_t recordCount() const = 0;
+    virtual std::optional<std::string_view> fieldAt(size_t record, int position) const = 0;
 };
 
 // A record-set source over a database file, as the agency control's design sets it up.

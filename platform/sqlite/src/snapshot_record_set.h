@@ -1,11 +1,13 @@
 // The rows of one query kept in memory, with a cursor over them.
 //
-// The values of all records lie end to end in one text, record by record, with the end of
-// each value and a null mark beside it: a million agencies take a few allocations, not a few
-// million.
+// The values lie end to end, record by record, in blocks of text of about a megabyte, with the
+// end of each value within its block and a null mark beside it: a million agencies take a few
+// dozen allocations and little more memory than their text, and the text is never copied to a
+// larger buffer as it grows.
 #pragma once
 
 #include <cstddef>
+#include <cstdint>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -23,7 +25,6 @@ class SnapshotRecordSet : public RecordSet {
     // Appends the next value of the record being built, in column order.
     void append(std::string_view text);
     void appendNull();
-    size_t recordCount() const { return records_; }
 
     bool eof() const override { return position_ >= records_; }
     bool bof() const override { return records_ == 0; }
@@ -32,24 +33,28 @@ class SnapshotRecordSet : public RecordSet {
     // Names match without regard to letter case, as the database's own column names do.
     std::optional<std::string> field(std::string_view name) const override;
     std::optional<std::string> field(int position) const override;
+    size_t recordCount() const override { return records_; }
+    std::optional<std::string_view> fieldAt(size_t record, int position) const override;
 
   private:
-    void valueAdded() {
-        if (++column_ == columns_.size()) {
-            column_ = 0;
-            ++records_;
-        }
-    }
+    struct Block {
+        std::string text;
+        size_t firstValue;  // the index of the first value it holds
+    };
+
+    void valueAdded(uint32_t end, bool null);
+    std::string_view value(size_t index) const;
     [[noreturn]] void fail(const std::string& what) const;
 
     std::vector<std::string> columns_;
     std::string origin_;
-    std::string text_;
-    std::vector<size_t> ends_;  // where each value ends in text_
+    std::vector<Block> blocks_;
+    std::vector<uint32_t> ends_;  // where each value ends in its block
     std::vector<bool> null_;
     size_t column_ = 0;   // of the record being built
     size_t records_ = 0;  // complete records
     size_t position_ = 0;
+    mutable size_t lastBlock_ = 0;  // where the last value read lay: reading goes mostly forward
 };
 
 }  // namespace ryx::sqlite

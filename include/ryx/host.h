@@ -310,12 +310,20 @@ class RecordSet {
     virtual std::optional<std::string> field(std::string_view name) const = 0;
     virtual std::optional<std::string> field(int position) const = 0;
 
-    // Reading without moving or copying: every record set of the agency source is a snapshot
-    // held in memory. The number of records, and a field of any record by position as a view
-    // that stays valid until the source is refreshed again; std::nullopt for a null value.
-    // DataSourceError for a record or a position out of range.
+    // Reading without moving or copying, as every record set of the agency source is a snapshot
+    // held in memory: the number of records, and field `position` of the records from `first`
+    // on into `values`, as many as it holds and there are; returns how many.
+    // The views stay valid until the source is refreshed again; std::nullopt for a null value.
+    // DataSourceError for a position out of range, or when there is no record `first`.
     virtual size_t recordCount() const = 0;
-    virtual std::optional<std::string_view> fieldAt(size_t record, int position) const = 0;
+    virtual size_t readField(int position, size_t first,
+                             std::span<std::optional<std::string_view>> values) const = 0;
+    // One field of one record, read as above.
+    std::optional<std::string_view> fieldAt(size_t record, int position) const {
+        std::optional<std::string_view> value;
+        readField(position, record, {&value, 1});
+        return value;
+    }
 };
 
 // A record-set source over a database file, as the agency control's design sets it up.

@@ -1,7 +1,6 @@
 #include "snapshot_record_set.h"
 
 #include <algorithm>
-#include <limits>
 
 #include "ryx/errors.h"
 #include "ryx/property_bag.h"
@@ -15,34 +14,87 @@ constexpr size_t kBlockBytes = size_t{1} << 20;
 
 }  // namespace
 
-SnapshotRecordSet::SnapshotRecordSet(std::vector<std::string> columns, std::string origin)
-    : columns_(std::move(columns)), origin_(std::move(origin)) {
-    if (columns_.empty()) fail("the query gives no columns");
+// ---- one column --------------------------------------------------------------------------
+
+void SnapshotRecordSet::Column::append(std::string_view text) {
+    std::string& block = blockFor(text.size()).text;
+    block += text;
+    ends_.push_back(static_cast<uint32_t>(block.size()));
 }
 
-void SnapshotRecordSet::append(std::string_view text) {
-    if (text.size() > std::numeric_limits<uint32_t>::max())
-        fail("a value of " + std::to_string(text.size()) + " bytes is too long to hold");
+void SnapshotRecordSet::Column::appendNull() {
+    ends_.push_back(static_cast<uint32_t>(blockFor(0).text.size()) | kNull);
+}
+
+// The block that takes a value of `length` bytes: the last one while the value fits in it, or
+// while it is empty; it counts the value as its own.
+SnapshotRecordSet::Column::Block& SnapshotRecordSet::Column::blockFor(size_t length) {
     if (blocks_.empty() ||
-        (!blocks_.back().text.empty() && blocks_.back().text.size() + text.size() > kBlockBytes)) {
-        Block next{{}, ends_.size()};
+        (!blocks_.back().text.empty() && blocks_.back().text.size() + length > kBlockBytes)) {
+        Block next{{}, ends_.size(), ends_.size()};
         // After the first block the records are many: take each block's room at once.
-        if (!blocks_.empty()) next.text.reserve(std::max(kBlockBytes, text.size()));
+        if (!blocks_.empty()) next.text.reserve(std::max(kBlockBytes, length));
         blocks_.push_back(std::move(next));
     }
-    std::string& block = blocks_.back().text;
-    block += text;
-    valueAdded(static_cast<uint32_t>(block.size()), false);
+    ++blocks_.back().end;
+    return blocks_.back();
+}
+
+void SnapshotRecordSet::Column::read(size_t first,
+                                     std::span<std::optional<std::string_view>> values) const {
+    const size_t last = first + values.size();
+    for (size_t block = blockOf(first), record = first; record < last; ++block) {
+        const char* text = blocks_[block].text.data();
+        uint32_t begin = record == blocks_[block].first ? 0 : ends_[record - 1] & ~kNull;
+        for (const size_t stop = std::min(blocks_[block].end, last); record < stop; ++record) {
+            const uint32_t end = ends_[record];
+            if (end & kNull)
+                values[record - first].reset();
+            else
+                values[record - first].emplace(text + begin, end - begin);
+            begin = end & ~kNull;
+        }
+    }
+}
+
+// The block of a record: the one where the last reading began, or the next, or found by
+// halving, so that reading the records in order never searches.
+size_t SnapshotRecordSet::Column::blockOf(size_t record) const {
+    auto holds = [&](size_t block) {
+        return block < blocks_.size() && record >= blocks_[block].first &&
+               record < blocks_[block].end;
+    };
+    if (!holds(lastBlock_) && !holds(++lastBlock_)) {
+        const auto after = std::upper_bound(blocks_.begin(), blocks_.end(), record,
+                                            [](size_t r, const Block& b) { return r < b.first; });
+        lastBlock_ = static_cast<size_t>(after - blocks_.begin()) - 1;
+    }
+    return lastBlock_;
+}
+
+// ---- the records -------------------------------------------------------------------------
+
+SnapshotRecordSet::SnapshotRecordSet(std::vector<std::string> columns, std::string origin)
+    : origin_(std::move(origin)) {
+    if (columns.empty()) fail("the query gives no columns");
+    for (std::string& name : columns)
+        columns_.emplace_back(std::move(name));
+}
+
+// A value longer than SQLite ever gives (2 GiB) would need the null mark's bit.
+void SnapshotRecordSet::append(std::string_view text) {
+    if (text.size() >= size_t{1} << 31)
+        fail("a value of " + std::to_string(text.size()) + " bytes is too long to hold");
+    columns_[column_].append(text);
+    valueAdded();
 }
 
 void SnapshotRecordSet::appendNull() {
-    if (blocks_.empty()) blocks_.push_back({{}, 0});
-    valueAdded(static_cast<uint32_t>(blocks_.back().text.size()), true);
+    columns_[column_].appendNull();
+    valueAdded();
 }
 
-void SnapshotRecordSet::valueAdded(uint32_t end, bool null) {
-    ends_.push_back(end);
-    null_.push_back(null);
+void SnapshotRecordSet::valueAdded() {
     if (++column_ == columns_.size()) {
         column_ = 0;
         ++records_;
@@ -56,53 +108,33 @@ void SnapshotRecordSet::moveNext() {
 
 std::optional<std::string> SnapshotRecordSet::field(std::string_view name) const {
     for (size_t column = 0; column < columns_.size(); ++column)
-        if (columns_[column] == name || keysEqual(columns_[column], name))
+        if (columns_[column].name() == name || keysEqual(columns_[column].name(), name))
             return field(static_cast<int>(column));
     fail("the query gives no field named \"" + std::string(name) + "\"");
 }
 
 std::optional<std::string> SnapshotRecordSet::field(int position) const {
-    if (position < 0 || static_cast<size_t>(position) >= columns_.size())
-        fail("there is no field at position " + std::to_string(position) + " of " +
-             std::to_string(columns_.size()));
-    if (eof()) fail("there is no current record");
+    if (eof() && position >= 0 && static_cast<size_t>(position) < columns_.size())
+        fail("there is no current record");
     const std::optional<std::string_view> value = fieldAt(position_, position);
     if (!value) return std::nullopt;
     return std::string(*value);
 }
 
-std::optional<std::string_view> SnapshotRecordSet::fieldAt(size_t record, int position) const {
+size_t SnapshotRecordSet::readField(int position, size_t first,
+                                    std::span<std::optional<std::string_view>> values) const {
+    if (position < 0 || static_cast<size_t>(position) >= columns_.size() || first >= records_)
+        failAt(first, position);
+    const size_t count = std::min(values.size(), records_ - first);
+    columns_[static_cast<size_t>(position)].read(first, values.first(count));
+    return count;
+}
+
+void SnapshotRecordSet::failAt(size_t record, int position) const {
     if (position < 0 || static_cast<size_t>(position) >= columns_.size())
         fail("there is no field at position " + std::to_string(position) + " of " +
              std::to_string(columns_.size()));
-    if (record >= records_)
-        fail("there is no record " + std::to_string(record + 1) + " of " +
-             std::to_string(records_));
-    const size_t index = record * columns_.size() + static_cast<size_t>(position);
-    if (null_[index]) return std::nullopt;
-    return value(index);
-}
-
-// The block of the value read last is tried first, then the one after it, so that reading the
-// records in order never searches.
-std::string_view SnapshotRecordSet::value(size_t index) const {
-    auto holds = [&](size_t block) {
-        return blocks_[block].firstValue <= index &&
-               (block + 1 == blocks_.size() || index < blocks_[block + 1].firstValue);
-    };
-    if (!holds(lastBlock_)) {
-        if (lastBlock_ + 1 < blocks_.size() && holds(lastBlock_ + 1)) {
-            ++lastBlock_;
-        } else {
-            const auto after =
-                std::upper_bound(blocks_.begin(), blocks_.end(), index,
-                                 [](size_t i, const Block& b) { return i < b.firstValue; });
-            lastBlock_ = static_cast<size_t>(after - blocks_.begin()) - 1;
-        }
-    }
-    const Block& block = blocks_[lastBlock_];
-    const size_t begin = index == block.firstValue ? 0 : ends_[index - 1];
-    return {block.text.data() + begin, ends_[index] - begin};
+    fail("there is no record " + std::to_string(record + 1) + " of " + std::to_string(records_));
 }
 
 void SnapshotRecordSet::fail(const std::string& what) const {

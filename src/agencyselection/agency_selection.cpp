@@ -1,6 +1,7 @@
 #include "ryx/agency_selection.h"
 
 #include <algorithm>
+#include <limits>
 #include <optional>
 #include <span>
 #include <string_view>
@@ -138,23 +139,23 @@ void RYXAgencySelection::setDatabaseName(std::string_view name) {
 }
 
 // Row i (from 1) shows the i-th record of the record set: ReturnedText relies on it to read
-// each picked row's code from the records rather than from the row text.
+// each picked row's code from the records rather than from the row text. The list asks for an
+// agency row's text when it needs it: the records hold the texts once, and they stay as they
+// are until the next fill, which clears the list before it refreshes them.
 void RYXAgencySelection::fillList() {
     LstAgMast_.clear();
     DatAgMast_.refresh();
     LstAgMast_.addItem(kOthersRow);
-    RecordSet& records = DatAgMast_.recordset();
-    std::string row;
-    while (!records.eof()) {
-        if (auto code = records.field("AgencyCd"))
-            row.assign(*code);
-        else
-            row.clear();
-        row += "  ";
-        if (auto name = records.field("Name")) row += *name;
-        LstAgMast_.addItem(row);
-        records.moveNext();
-    }
+    const RecordSet& records = DatAgMast_.recordset();
+    if (records.recordCount() >= static_cast<size_t>(std::numeric_limits<int32_t>::max()))
+        throw OverflowError("the agency table has more agencies than a list can hold");
+    // The query gives the code, then the name.
+    LstAgMast_.addRows(static_cast<int32_t>(records.recordCount()),
+                       [&records](int32_t record, std::string& row) {
+                           row.assign(records.fieldAt(static_cast<size_t>(record), 0).value_or(""));
+                           row += "  ";
+                           row += records.fieldAt(static_cast<size_t>(record), 1).value_or("");
+                       });
 }
 
 // ---- criterion -----------------------------------------------------------------------------

@@ -44,8 +44,8 @@ std::string figure(double value, const std::string& unit) {
 }  // namespace
 
 void printRatioTable(const std::vector<RatioRow>& rows) {
-    std::printf("\n%-44s %12s %12s %8s %7s  %s\n", "Benchmark (medians)", "subject", "baseline",
-                "ratio", "target", "");
+    std::printf("\n%-44s %12s %12s %8s %7s\n", "Benchmark (medians)", "subject", "baseline",
+                "ratio", "target");
     std::printf("%s\n", std::string(92, '-').c_str());
     for (const RatioRow& r : rows) {
         if (r.subject <= 0 || r.baseline <= 0) {

@@ -189,6 +189,23 @@ class ListBox : public Widget {
     // Sets the flag of every row from `first` to `last` inclusive; one Click at most.
     virtual void setSelectedRange(int32_t first, int32_t last, bool v) = 0;
     virtual void setListIndex(int32_t row) = 0;  // the current row
+    // The selected flags of every row at once, one byte a row (1 selected, 0 not), for reading
+    // a long list in one pass; valid until the rows or their flags change.
+    virtual std::span<const uint8_t> selectedFlags() const = 0;
+
+    // Appends `count` rows whose texts the list asks of `text` (with 0 for the first of them)
+    // whenever it needs one, instead of holding a copy of each. `text` must stay callable and
+    // give the same texts until the list is cleared. The default asks once per row and adds a
+    // copy of each text.
+    using RowText = std::function<void(int32_t row, std::string& text)>;
+    virtual void addRows(int32_t count, RowText text) {
+        std::string row;
+        for (int32_t i = 0; i < count; ++i) {
+            row.clear();
+            text(i, row);
+            addItem(row);
+        }
+    }
     virtual Color backColor() const = 0;
     virtual void setBackColor(Color c) = 0;
     virtual Color foreColor() const = 0;  // the text colour
@@ -292,6 +309,21 @@ class RecordSet {
     // The current record's value; std::nullopt for a null value.
     virtual std::optional<std::string> field(std::string_view name) const = 0;
     virtual std::optional<std::string> field(int position) const = 0;
+
+    // Reading without moving or copying, as every record set of the agency source is a snapshot
+    // held in memory: the number of records, and field `position` of the records from `first`
+    // on into `values`, as many as it holds and there are; returns how many.
+    // The views stay valid until the source is refreshed again; std::nullopt for a null value.
+    // DataSourceError for a position out of range, or when there is no record `first`.
+    virtual size_t recordCount() const = 0;
+    virtual size_t readField(int position, size_t first,
+                             std::span<std::optional<std::string_view>> values) const = 0;
+    // One field of one record, read as above.
+    std::optional<std::string_view> fieldAt(size_t record, int position) const {
+        std::optional<std::string_view> value;
+        readField(position, record, {&value, 1});
+        return value;
+    }
 };
 
 // A record-set source over a database file, as the agency control's design sets it up.

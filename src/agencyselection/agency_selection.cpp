@@ -1,6 +1,10 @@
 #include "ryx/agency_selection.h"
 
 #include <algorithm>
+#include <limits>
+#include <optional>
+#include <span>
+#include <string_view>
 
 namespace ryx {
 namespace {
@@ -75,16 +79,27 @@ constexpr WidgetDesign kButton{.kind = WidgetKind::CommandButton,
 // and turn the rest of itself into formula text.
 void appendQuoted(std::string& text, std::string_view code) {
     text += '"';
-    auto quote = [](char c) { return c == '"'; };
-    for (auto at = std::find_if(code.begin(), code.end(), quote); at != code.end();
-         at = std::find_if(code.begin(), code.end(), quote)) {
-        const auto length = static_cast<size_t>(at - code.begin()) + 1;
+    for (auto quote = std::find(code.begin(), code.end(), '"'); quote != code.end();
+         quote = std::find(code.begin(), code.end(), '"')) {
+        const auto length = static_cast<size_t>(quote - code.begin()) + 1;
         text.append(code.substr(0, length));
         text += '"';
         code.remove_prefix(length);
     }
     text.append(code);
     text += '"';
+}
+
+// Room for `rows` codes at the mean length of the first ones read, each with `extra` bytes
+// around it, so that a text of a million codes is written once rather than copied again each
+// time it outgrows its room.
+void reserveForCodes(std::string& text, std::span<const std::optional<std::string_view>> first,
+                     size_t rows, size_t extra) {
+    size_t bytes = 0;
+    for (const std::optional<std::string_view>& code : first)
+        bytes += code ? code->size() : 0;
+    const size_t mean = (bytes + first.size() - 1) / first.size();
+    text.reserve(text.size() + 1 + rows * (mean + extra));
 }
 
 }  // namespace
@@ -124,23 +139,23 @@ void RYXAgencySelection::setDatabaseName(std::string_view name) {
 }
 
 // Row i (from 1) shows the i-th record of the record set: ReturnedText relies on it to read
-// each picked row's code from the records rather than from the row text.
+// each picked row's code from the records rather than from the row text. The list asks for an
+// agency row's text when it needs it: the records hold the texts once, and they stay as they
+// are until the next fill, which clears the list before it refreshes them.
 void RYXAgencySelection::fillList() {
     LstAgMast_.clear();
     DatAgMast_.refresh();
     LstAgMast_.addItem(kOthersRow);
-    RecordSet& records = DatAgMast_.recordset();
-    std::string row;
-    while (!records.eof()) {
-        if (auto code = records.field("AgencyCd"))
-            row.assign(*code);
-        else
-            row.clear();
-        row += "  ";
-        if (auto name = records.field("Name")) row += *name;
-        LstAgMast_.addItem(row);
-        records.moveNext();
-    }
+    const RecordSet& records = DatAgMast_.recordset();
+    if (records.recordCount() >= static_cast<size_t>(std::numeric_limits<int32_t>::max()))
+        throw OverflowError("the agency table has more agencies than a list can hold");
+    // The query gives the code, then the name.
+    LstAgMast_.addRows(static_cast<int32_t>(records.recordCount()),
+                       [&records](int32_t record, std::string& row) {
+                           row.assign(records.fieldAt(static_cast<size_t>(record), 0).value_or(""));
+                           row += "  ";
+                           row += records.fieldAt(static_cast<size_t>(record), 1).value_or("");
+                       });
 }
 
 // ---- criterion -----------------------------------------------------------------------------
@@ -154,25 +169,40 @@ std::string RYXAgencySelection::ReturnedText() {
 
     RecordSet& records = DatAgMast_.recordset();
     if (!records.bof()) records.moveFirst();
-    std::string text = crystal_ ? "[" : "";
+    const bool formula = crystal_;
+    const std::span<const uint8_t> picked = LstAgMast_.selectedFlags();
+    std::string text = formula ? "[" : "";
     const size_t start = text.size();
-    const int32_t rows = LstAgMast_.listCount();
-    if (rows > 0 && LstAgMast_.selected(0)) text += crystal_ ? R"("*")" : "*";
-    for (int32_t row = 1; row < rows; ++row) {
-        if (LstAgMast_.selected(row)) {
-            const std::optional<std::string> code = records.field(0);
-            const std::string_view shown = code ? std::string_view(*code) : std::string_view();
-            if (!crystal_) {
-                text += shown;  // joined with nothing between, as host reports split it
-            } else {
+    if (!picked.empty() && picked[0]) text += formula ? R"("*")" : "*";
+    // Row i (from 1) shows record i - 1: the codes come from the records, never from the rows,
+    // a batch of records at a time.
+    std::array<std::optional<std::string_view>, 256> codes;
+    std::string_view joined;  // plain form: codes lying one after another, copied as one
+    for (size_t row = 1; row < picked.size();) {
+        const size_t batch = std::min(codes.size(), picked.size() - row);
+        const size_t read = records.readField(0, row - 1, std::span(codes).first(batch));
+        if (row == 1)
+            reserveForCodes(text, std::span(codes).first(read), picked.size(), formula ? 3 : 0);
+        const uint8_t* const flags = picked.data() + row;
+        for (size_t i = 0; i < read; ++i) {
+            if (!flags[i]) continue;
+            const std::string_view code = codes[i] ? *codes[i] : std::string_view();
+            if (formula) {
                 if (text.size() > start) text += ',';
-                appendQuoted(text, shown);
+                appendQuoted(text, code);
+            } else if (joined.data() && joined.data() + joined.size() == code.data()) {
+                joined = {joined.data(), joined.size() + code.size()};
+            } else {
+                text += joined;  // joined with nothing between, as host reports split it
+                joined = code;
             }
         }
-        records.moveNext();  // in step with the rows, picked or not
+        row += read;
     }
+    text += joined;
     if (text.size() == start) return "+";
-    if (crystal_) text += ']';
+    if (formula) text += ']';
+    if (text.capacity() > 2 * text.size()) text.shrink_to_fit();  // few rows were picked
     return text;
 }
 

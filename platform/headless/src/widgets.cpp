@@ -79,45 +79,33 @@ void HListBox::checkRow(int32_t row, const char* what) const {
 
 void HListBox::clear() {
     rows_.clear();
-    selected_.clear();
     current_ = -1;
 }
 
 void HListBox::addItem(std::string_view text) {
-    rows_.emplace_back(text);
-    selected_.push_back(0);
+    rows_.add(text);
 }
 
 std::string HListBox::list(int32_t row) const {
     checkRow(row, "List");
-    return rows_[static_cast<size_t>(row)];
+    return rows_.text(row);
 }
 
 bool HListBox::selected(int32_t row) const {
     checkRow(row, "Selected");
-    return selected_[static_cast<size_t>(row)] != 0;
+    return rows_.selected(row);
 }
 
 void HListBox::setSelected(int32_t row, bool v) {
     checkRow(row, "Selected");
-    uint8_t& flag = selected_[static_cast<size_t>(row)];
-    if ((flag != 0) == v) return;
-    flag = v ? 1 : 0;
-    notify(Notify::Click);
+    if (rows_.setSelected(row, row, v)) notify(Notify::Click);
 }
 
 void HListBox::setSelectedRange(int32_t first, int32_t last, bool v) {
     if (first > last) return;
     checkRow(first, "Selected");
     checkRow(last, "Selected");
-    bool changed = false;
-    for (auto i = static_cast<size_t>(first); i <= static_cast<size_t>(last); ++i) {
-        if ((selected_[i] != 0) != v) {
-            selected_[i] = v ? 1 : 0;
-            changed = true;
-        }
-    }
-    if (changed) notify(Notify::Click);
+    if (rows_.setSelected(first, last, v)) notify(Notify::Click);
 }
 
 void HListBox::setListIndex(int32_t row) {
@@ -129,15 +117,14 @@ void HListBox::setListIndex(int32_t row) {
 
 int32_t HListBox::selCount() const {
     int32_t n = 0;
-    for (uint8_t f : selected_)
+    for (uint8_t f : rows_.flags())
         n += f;
     return n;
 }
 
 void HListBox::clickRow(int32_t row) {
     checkRow(row, "Click");
-    uint8_t& flag = selected_[static_cast<size_t>(row)];
-    flag = flag ? 0 : 1;
+    rows_.setSelected(row, row, !rows_.selected(row));
     current_ = row;
     notify(Notify::Click);
 }

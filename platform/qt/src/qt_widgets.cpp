@@ -268,15 +268,16 @@ int RowsModel::rowCount(const QModelIndex& parent) const {
 
 QVariant RowsModel::data(const QModelIndex& index, int role) const {
     if (!index.isValid() || index.row() >= count()) return {};
-    const auto row = static_cast<size_t>(index.row());
+    const int32_t row = index.row();
     switch (role) {
         case Qt::DisplayRole:
-            return QString::fromUtf8(rows_[row]);
+            return QString::fromStdString(rows_.text(row));
         case Qt::BackgroundRole:
-            return selected_[row] ? QVariant(QApplication::palette().brush(QPalette::Highlight))
-                                  : QVariant();
+            return rows_.selected(row)
+                       ? QVariant(QApplication::palette().brush(QPalette::Highlight))
+                       : QVariant();
         case Qt::ForegroundRole:
-            return selected_[row]
+            return rows_.selected(row)
                        ? QVariant(QApplication::palette().brush(QPalette::HighlightedText))
                        : QVariant();
         default:
@@ -285,13 +286,7 @@ QVariant RowsModel::data(const QModelIndex& index, int role) const {
 }
 
 bool RowsModel::setSelected(int32_t first, int32_t last, bool v) {
-    bool changed = false;
-    for (auto i = static_cast<size_t>(first); i <= static_cast<size_t>(last); ++i) {
-        if ((selected_[i] != 0) != v) {
-            selected_[i] = v ? 1 : 0;
-            changed = true;
-        }
-    }
+    const bool changed = rows_.setSelected(first, last, v);
     if (changed && first < announced_)
         emit dataChanged(index(first), index(std::min<int32_t>(last, announced_ - 1)));
     return changed;
@@ -300,7 +295,6 @@ bool RowsModel::setSelected(int32_t first, int32_t last, bool v) {
 void RowsModel::clear() {
     beginResetModel();
     rows_.clear();
-    selected_.clear();
     announced_ = 0;
     endResetModel();
 }
@@ -308,8 +302,16 @@ void RowsModel::clear() {
 // Appended rows reach the view in one announcement, when the running handler has returned:
 // a million appends then cost one insertion in the view, not a million.
 void RowsModel::append(std::string_view text) {
-    rows_.emplace_back(text);
-    selected_.push_back(0);
+    rows_.add(text);
+    announceLater();
+}
+
+void RowsModel::append(int32_t count, ListBox::RowText text) {
+    rows_.add(count, std::move(text));
+    announceLater();
+}
+
+void RowsModel::announceLater() {
     if (announceScheduled_) return;
     announceScheduled_ = true;
     QTimer::singleShot(0, this, [this] { announce(); });

@@ -13,6 +13,7 @@
 #include <vector>
 
 #include "ryx/common/line_edit.h"
+#include "ryx/common/list_rows.h"
 #include "ryx/common/masked_text.h"
 #include "ryx/host.h"
 
@@ -152,24 +153,28 @@ class QtCheckBox : public QtWidgetOf<ryx::CheckBox> {
 };
 
 // The rows of a list, with a selected flag each. The view draws a selected row highlighted;
-// the flags live here, so selecting a million rows is one pass over a byte vector.
+// the flags live here, so selecting a million rows is one pass over a byte vector, and the
+// view asks for the texts of the rows it shows only.
 class RowsModel : public QAbstractListModel {
   public:
     int rowCount(const QModelIndex& parent = {}) const override;
     QVariant data(const QModelIndex& index, int role) const override;
 
-    int32_t count() const { return static_cast<int32_t>(rows_.size()); }
-    const std::string& row(int32_t i) const { return rows_[static_cast<size_t>(i)]; }
-    bool isSelected(int32_t i) const { return selected_[static_cast<size_t>(i)] != 0; }
+    int32_t count() const { return rows_.count(); }
+    std::string row(int32_t i) const { return rows_.text(i); }
+    bool isSelected(int32_t i) const { return rows_.selected(i); }
+    std::span<const uint8_t> flags() const { return rows_.flags(); }
     bool setSelected(int32_t first, int32_t last, bool v);  // true when a flag changed
     void clear();
     void append(std::string_view text);
+    void append(int32_t count, ListBox::RowText text);
     // Tells the view about rows appended since the last announcement.
     void announce();
 
   private:
-    std::vector<std::string> rows_;
-    std::vector<uint8_t> selected_;
+    void announceLater();
+
+    common::ListRows rows_;
     int announced_ = 0;
     bool announceScheduled_ = false;
 };
@@ -185,6 +190,8 @@ class QtListBox : public QtWidgetOf<ryx::ListBox> {
     void setSelected(int32_t row, bool v) override;
     void setSelectedRange(int32_t first, int32_t last, bool v) override;
     void setListIndex(int32_t row) override;
+    std::span<const uint8_t> selectedFlags() const override { return model_.flags(); }
+    void addRows(int32_t count, RowText text) override { model_.append(count, std::move(text)); }
     Color backColor() const override { return back_; }
     void setBackColor(Color c) override;
     Color foreColor() const override { return fore_; }

@@ -7,6 +7,7 @@
 #include <vector>
 
 #include "ryx/common/line_edit.h"
+#include "ryx/common/list_rows.h"
 #include "ryx/common/masked_text.h"
 #include "ryx/host.h"
 
@@ -138,12 +139,14 @@ class HListBox : public WidgetOf<ryx::ListBox> {
     HListBox(Site* site, const WidgetDesign& d);
     void clear() override;
     void addItem(std::string_view text) override;
-    int32_t listCount() const override { return static_cast<int32_t>(rows_.size()); }
+    int32_t listCount() const override { return rows_.count(); }
     std::string list(int32_t row) const override;
     bool selected(int32_t row) const override;
     void setSelected(int32_t row, bool v) override;
     void setSelectedRange(int32_t first, int32_t last, bool v) override;
     void setListIndex(int32_t row) override;
+    std::span<const uint8_t> selectedFlags() const override { return rows_.flags(); }
+    void addRows(int32_t count, RowText text) override { rows_.add(count, std::move(text)); }
     Color backColor() const override { return back_; }
     void setBackColor(Color c) override { back_ = c; }
     Color foreColor() const override { return fore_; }
@@ -165,8 +168,7 @@ class HListBox : public WidgetOf<ryx::ListBox> {
   private:
     void checkRow(int32_t row, const char* what) const;
 
-    std::vector<std::string> rows_;
-    std::vector<uint8_t> selected_;
+    common::ListRows rows_;
     int32_t current_ = -1;
     Color back_, fore_;
 };

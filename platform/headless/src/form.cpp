@@ -4,29 +4,12 @@
 #include <ctime>
 
 #include "control_types.h"
+#include "ryx/common/missing_record_source.h"
 #include "ryx/common/utf8.h"
 #include "ryx/errors.h"
 
 namespace ryx::headless {
 namespace {
-
-// Stands in for the agency database where the host has set up no database engine.
-class MissingRecordSource : public RecordSource {
-  public:
-    explicit MissingRecordSource(const DataSourceDesign& d) : query_(d.recordSource) {}
-    void setDatabaseName(std::string_view name) override { name_ = name; }
-    std::string databaseName() const override { return name_; }
-    std::string recordSource() const override { return query_; }
-    void refresh() override { fail(); }
-    RecordSet& recordset() override { fail(); }
-
-  private:
-    [[noreturn]] void fail() const {
-        throw DataSourceError("cannot open database \"" + name_ +
-                              "\": no database engine is set up for this form");
-    }
-    std::string name_, query_;
-};
 
 WidgetDesign plainDesign(WidgetKind kind, const std::string& name) {
     return {.kind = kind, .name = name, .backColor = 0x00FFFFFF, .tabIndex = 0, .inFrame = false};
@@ -95,7 +78,7 @@ CivilDate Form::today() const {
 
 std::unique_ptr<RecordSource> Form::makeRecordSource(const DataSourceDesign& d) const {
     if (recordSources_) return recordSources_(d);
-    return std::make_unique<MissingRecordSource>(d);
+    return std::make_unique<common::MissingRecordSource>(d);
 }
 
 // ---- focus -------------------------------------------------------------------------------

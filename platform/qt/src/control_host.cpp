@@ -10,6 +10,7 @@
 #include <cmath>
 
 #include "qt_widgets.h"
+#include "ryx/common/missing_record_source.h"
 #include "ryx/errors.h"
 
 namespace ryx::qt {
@@ -27,24 +28,6 @@ RecordSourceFactory& recordSourceFactory() {
     static RecordSourceFactory factory;
     return factory;
 }
-
-// Stands in for the agency database where the application has set up no database engine.
-class MissingRecordSource : public RecordSource {
-  public:
-    explicit MissingRecordSource(const DataSourceDesign& d) : query_(d.recordSource) {}
-    void setDatabaseName(std::string_view name) override { name_ = name; }
-    std::string databaseName() const override { return name_; }
-    std::string recordSource() const override { return query_; }
-    void refresh() override { fail(); }
-    RecordSet& recordset() override { fail(); }
-
-  private:
-    [[noreturn]] void fail() const {
-        throw DataSourceError("cannot open database \"" + name_ +
-                              "\": no database engine is set up for this application");
-    }
-    std::string name_, query_;
-};
 
 int16_t mouseButtons(Qt::MouseButtons b) {
     int16_t bits = 0;
@@ -269,7 +252,7 @@ RecordSource& ControlHost::addRecordSource(const DataSourceDesign& d) {
     if (recordSourceFactory())
         recordSource_ = recordSourceFactory()(d);
     else
-        recordSource_ = std::make_unique<MissingRecordSource>(d);
+        recordSource_ = std::make_unique<common::MissingRecordSource>(d);
     return *recordSource_;
 }
 

@@ -252,7 +252,11 @@ std::optional<std::vector<std::string>> formulaItems(std::string_view text) {
 
 void checkCriterion(const std::string& text, bool crystal, const std::vector<std::string>& picked,
                     std::string_view plainSeparator, const char* control) {
-    const std::string where = std::string(control) + " criterion \"" + text + "\"";
+    std::string shown;
+    for (const std::string& item : picked)
+        shown += "|" + item;
+    const std::string where =
+        std::string(control) + " criterion \"" + text + "\" for the picks " + shown;
     if (picked.empty()) {
         CHECK(text == "+", where + ": nothing picked is not \"+\"");
         return;
@@ -266,7 +270,9 @@ void checkCriterion(const std::string& text, bool crystal, const std::vector<std
     std::string plain;
     for (const std::string& item : picked)
         plain += (plain.empty() ? "" : std::string(plainSeparator)) + item;
-    CHECK(text == plain, where + ": not the picked items, plain");
+    // The plain syntax has no way to write an empty code: picks of empty codes alone read as
+    // nothing picked.
+    CHECK(text == (plain.empty() ? "+" : plain), where + ": not the picked items, plain");
 }
 
 bool isDigits(std::string_view s) {

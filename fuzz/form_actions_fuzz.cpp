@@ -704,6 +704,8 @@ void saveAndReload(std::unique_ptr<Screen>& s, CivilDate today) {
           "a saved form does not load as it was saved:\n" + saved + "\n---\n" +
               formToJson(reopened->form));
     s = std::move(reopened);
+    // The host names the agency database again once the screen is open.
+    if (s->form.userMode()) setDatabaseName(*s, databases().names().front());
 }
 
 void step(std::unique_ptr<Screen>& screen, FuzzedDataProvider& in, CivilDate today) {
@@ -793,6 +795,7 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
     const bool readDatesEveryStep = in.ConsumeBool();
     databases().replaceLive(0);
     auto screen = std::make_unique<Screen>(nullptr, today, true);
+    setDatabaseName(*screen, databases().names().front());
     for (int steps = 0; steps < 200 && in.remaining_bytes() > 0; ++steps) {
         step(screen, in, today);
         checkScreen(*screen, readDatesEveryStep);

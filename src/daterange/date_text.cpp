@@ -50,7 +50,11 @@ int centuryOf(int twoDigitYear) {
 }
 
 std::optional<int> yearValue(std::string_view s) {
-    if (s.size() == 2) return centuryOf(*digitsValue(s, 2));
+    if (s.size() == 2) {
+        auto twoDigits = digitsValue(s, 2);
+        if (!twoDigits) return std::nullopt;
+        return centuryOf(*twoDigits);
+    }
     if (s.size() != 4) return std::nullopt;
     auto year = digitsValue(s, 4);
     if (!year || *year < 1000) return std::nullopt;

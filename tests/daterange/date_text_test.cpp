@@ -64,4 +64,14 @@ TEST(DateText, TheValidDateTest) {
         EXPECT_FALSE(isDate(text)) << text;
 }
 
+// Found in review: a two-character year that is not a number ("ab") was read through an empty
+// value, so "01/05/ab" could pass as a date and come back with a year of garbage.
+TEST(DateText, ATwoCharacterYearThatIsNoNumberIsNoDate) {
+    for (const char* text : {"01/05/ab", "01/05/1a", "01/05/ 1x", "01/05/-1"}) {
+        EXPECT_FALSE(isDate(text)) << text;
+        std::string box = text;
+        EXPECT_EQ(d_DateCheck(box), Variant(std::string(text))) << text;
+    }
+}
+
 }  // namespace

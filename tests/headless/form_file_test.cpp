@@ -96,6 +96,28 @@ TEST(FormFile, SavingReplacesTheFileWholeAndLeavesNoTemporaryFile) {
     EXPECT_FALSE(dynamic_cast<RYXPolicyStatus&>(loaded.sites()[0]->control()).CrystalStyle());
 }
 
+// Found in review: every save made the form file readable by everyone, and a form file reached
+// through a link was replaced by a plain file.
+TEST(FormFile, ASaveKeepsTheFilesPermissionsAndItsLink) {
+    ryx::testing::TempFolder tmp;
+    Form form;
+    form.add<RYXPolicyStatus>("ps");
+    const auto file = tmp / "private.json";
+    writeFile(file, "old");
+    std::filesystem::permissions(
+        file, std::filesystem::perms::owner_read | std::filesystem::perms::owner_write);
+    saveForm(form, file);
+    EXPECT_EQ(std::filesystem::status(file).permissions(),
+              std::filesystem::perms::owner_read | std::filesystem::perms::owner_write);
+
+    const auto link = tmp / "link.json";
+    std::filesystem::create_symlink("private.json", link);
+    dynamic_cast<RYXPolicyStatus&>(form.site("ps").control()).setCrystalStyle(false);
+    saveForm(form, link);
+    EXPECT_TRUE(std::filesystem::is_symlink(link));
+    EXPECT_NE(readFile(file).find("\"CrystalStyle\": false"), std::string::npos);
+}
+
 TEST(FormFile, ASaveThatCannotBeWrittenNamesTheFile) {
     ryx::testing::TempFolder tmp;
     Form form;

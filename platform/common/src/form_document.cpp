@@ -91,6 +91,16 @@ void writeAll(int fd, std::string_view data, const std::filesystem::path& tmp) {
     }
 }
 
+// The new file keeps the permissions of the one it replaces (a private form stays private);
+// a new form file gets those of any new file.
+mode_t modeFor(const std::filesystem::path& file) {
+    struct stat st {};
+    if (::stat(file.c_str(), &st) == 0) return st.st_mode & 07777;
+    const mode_t mask = ::umask(0);
+    ::umask(mask);
+    return 0666 & ~mask;
+}
+
 void syncFolder(const std::filesystem::path& folder) {
     int fd = ::open(folder.c_str(), O_RDONLY | O_DIRECTORY);
     if (fd < 0) return;
@@ -115,7 +125,11 @@ std::string formToJson(std::span<const FormControl> controls) {
     return doc.dump(2, ' ', false, json::error_handler_t::replace) + "\n";
 }
 
-void writeFormFile(const std::filesystem::path& file, std::string_view data) {
+void writeFormFile(const std::filesystem::path& name, std::string_view data) {
+    // A form file reached through a link is replaced where it lies, and the link stays.
+    std::error_code ec;
+    const std::filesystem::path file =
+        std::filesystem::is_symlink(name, ec) ? std::filesystem::weakly_canonical(name, ec) : name;
     std::filesystem::path folder = file.parent_path();
     if (folder.empty()) folder = ".";
     std::string pattern = (folder / ("." + file.filename().string() + ".XXXXXX")).string();
@@ -123,7 +137,7 @@ void writeFormFile(const std::filesystem::path& file, std::string_view data) {
     if (fd < 0) throw FormFileError(systemError("cannot save form file", file));
     const std::filesystem::path tmp = pattern;
     try {
-        ::fchmod(fd, 0644);
+        ::fchmod(fd, modeFor(file));
         writeAll(fd, data, tmp);
         if (::fsync(fd) != 0) throw FormFileError(systemError("cannot flush", tmp));
         if (::close(fd) != 0) {

@@ -95,7 +95,6 @@ class Site : public Container {
     Font font_;
     int repaints_ = 0;
     int resizes_ = 0;
-    bool resizing_ = false;
     std::vector<std::string> notifications_;
     std::vector<std::unique_ptr<Node>> children_;
     HFrame* frame_ = nullptr;

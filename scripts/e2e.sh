@@ -4,6 +4,8 @@
 # criteria that the demo prints.
 #   scripts/e2e.sh path/to/ryx-demo
 set -euo pipefail
+# Under the sanitizers, the memory that X and D-Bus libraries keep for the process is no leak.
+export LSAN_OPTIONS="${LSAN_OPTIONS:-suppressions=$(realpath "$(dirname "$0")/../tests/lsan.supp")}"
 
 # Inside the X server: start the demo, type, quit.
 if [ "${1:-}" = "--inside" ]; then

@@ -73,14 +73,14 @@ bool MaskedText::deleteAt(size_t pos) {
 
 bool MaskedText::clearSelection() {
     bool changed = false;
-    const auto end = static_cast<size_t>(selStart_) + static_cast<size_t>(selLength_);
-    for (auto i = static_cast<size_t>(selStart_); i < end; ++i) {
+    const auto end = static_cast<size_t>(sel_.start()) + static_cast<size_t>(sel_.length());
+    for (auto i = static_cast<size_t>(sel_.start()); i < end; ++i) {
         if (editable(i) && chars_[i] != prompt_) {
             chars_[i] = prompt_;
             changed = true;
         }
     }
-    select(selStart_, selStart_);
+    select(sel_.start(), sel_.start());
     return changed;
 }
 
@@ -99,15 +99,6 @@ void MaskedText::fill(std::u32string_view text) {
             chars_[pos] = prompt_;
         }
     }
-}
-
-void MaskedText::select(int32_t anchor, int32_t caret) {
-    const int32_t len = length();
-    anchor = std::clamp(anchor, 0, len);
-    caret = std::clamp(caret, 0, len);
-    selStart_ = std::min(anchor, caret);
-    selLength_ = std::max(anchor, caret) - selStart_;
-    caretAtStart_ = caret < anchor;
 }
 
 void MaskedText::setMask(std::string_view mask) {
@@ -158,7 +149,7 @@ void MaskedText::setText(std::string_view text) {
 }
 
 int32_t MaskedText::selStart() const {
-    return masked() ? selStart_ : plain_.selStart();
+    return masked() ? sel_.start() : plain_.selStart();
 }
 
 void MaskedText::setSelStart(int32_t v) {
@@ -166,12 +157,11 @@ void MaskedText::setSelStart(int32_t v) {
         plain_.setSelStart(v);
         return;
     }
-    const int32_t pos = std::clamp(v, 0, length());
-    select(pos, pos);
+    sel_.setStart(v, length());
 }
 
 int32_t MaskedText::selLength() const {
-    return masked() ? selLength_ : plain_.selLength();
+    return masked() ? sel_.length() : plain_.selLength();
 }
 
 void MaskedText::setSelLength(int32_t v) {
@@ -179,59 +169,41 @@ void MaskedText::setSelLength(int32_t v) {
         plain_.setSelLength(v);
         return;
     }
-    const int32_t n = std::clamp(v, 0, length() - selStart_);
-    select(selStart_, selStart_ + n);
+    sel_.setLength(v, length());
 }
 
 bool MaskedText::keyDown(int16_t keyCode, int16_t shift) {
     if (!masked()) return plain_.keyDown(keyCode, shift);
-    const bool extend = (shift & ryx::shift::Shift) != 0;
-    int32_t target = 0;
-    switch (keyCode) {
-        case vk::Home:
-            target = 0;
-            break;
-        case vk::End:
-            target = length();
-            break;
-        case vk::Left:
-            target = (!extend && selLength_ > 0) ? selStart_ : caret() - 1;
-            break;
-        case vk::Right:
-            target = (!extend && selLength_ > 0) ? selStart_ + selLength_ : caret() + 1;
-            break;
-        case vk::Delete:
-            if (selLength_ > 0) return clearSelection();
-            // At a literal or at the end there is nothing to delete.
-            return deleteAt(static_cast<size_t>(selStart_));
-        default:
-            return false;
+    if (keyCode != vk::Delete) {
+        sel_.move(keyCode, shift, length());
+        return false;
     }
-    select(extend ? anchor() : target, target);
-    return false;
+    if (sel_.length() > 0) return clearSelection();
+    // At a literal or at the end there is nothing to delete.
+    return deleteAt(static_cast<size_t>(sel_.start()));
 }
 
 bool MaskedText::keyChar(int16_t keyChar) {
     if (!masked()) return plain_.keyChar(keyChar);
     const char32_t c = static_cast<uint16_t>(keyChar);
     if (c == kBackspace) {
-        if (selLength_ > 0) return clearSelection();
-        int32_t pos = selStart_ - 1;
+        if (sel_.length() > 0) return clearSelection();
+        int32_t pos = sel_.start() - 1;
         while (pos >= 0 && !editable(static_cast<size_t>(pos)))
             --pos;
         if (pos < 0) return false;
         select(pos, pos);
         return deleteAt(static_cast<size_t>(pos));
     }
-    if (c == kCut) return selLength_ > 0 && clearSelection();
+    if (c == kCut) return sel_.length() > 0 && clearSelection();
     if (!isPrintable(c)) return false;
 
-    const auto start = static_cast<size_t>(selStart_);
+    const auto start = static_cast<size_t>(sel_.start());
     if (start >= slots_.size()) return false;
     size_t pos = start;
     if (!editable(pos)) {
         if (chars_[pos] == c) {  // typing the literal steps over it
-            select(selStart_ + 1, selStart_ + 1);
+            select(sel_.start() + 1, sel_.start() + 1);
             return false;
         }
         while (pos < slots_.size() && !editable(pos))

@@ -7,6 +7,8 @@
 #include <string>
 #include <string_view>
 
+#include "ryx/common/selection.h"
+
 namespace ryx::common {
 
 class LineEdit {
@@ -17,10 +19,10 @@ class LineEdit {
     void setText(std::string_view text);
 
     // Positions count characters, not bytes. Setters clamp to the text.
-    int32_t selStart() const { return selStart_; }
-    void setSelStart(int32_t v);
-    int32_t selLength() const { return selLength_; }
-    void setSelLength(int32_t v);
+    int32_t selStart() const { return sel_.start(); }
+    void setSelStart(int32_t v) { sel_.setStart(v, length()); }
+    int32_t selLength() const { return sel_.length(); }
+    void setSelLength(int32_t v) { sel_.setLength(v, length()); }
     std::string selectedText() const;
 
     int32_t maxLength() const { return maxLength_; }  // 0: no limit
@@ -41,15 +43,10 @@ class LineEdit {
   private:
     void replaceSelection(std::u32string_view with);
     int32_t length() const;
-    int32_t caret() const { return caretAtStart_ ? selStart_ : selStart_ + selLength_; }
-    int32_t anchor() const { return caretAtStart_ ? selStart_ + selLength_ : selStart_; }
-    void select(int32_t anchor, int32_t caret);
 
     std::u32string text_;
-    int32_t selStart_ = 0;
-    int32_t selLength_ = 0;
+    Selection sel_;
     int32_t maxLength_ = 0;
-    bool caretAtStart_ = false;  // the caret is at the selection's start (Shift+Left, ...)
 };
 
 }  // namespace ryx::common

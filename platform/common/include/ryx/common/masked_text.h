@@ -22,6 +22,7 @@
 #include <vector>
 
 #include "ryx/common/line_edit.h"
+#include "ryx/common/selection.h"
 
 namespace ryx::common {
 
@@ -62,17 +63,13 @@ class MaskedText {
     bool deleteAt(size_t pos);          // true when the text changed
     bool clearSelection();              // true when the text changed
     void fill(std::u32string_view text);
-    int32_t caret() const { return caretAtStart_ ? selStart_ : selStart_ + selLength_; }
-    int32_t anchor() const { return caretAtStart_ ? selStart_ + selLength_ : selStart_; }
-    void select(int32_t anchor, int32_t caret);
+    void select(int32_t anchor, int32_t caret) { sel_.select(anchor, caret, length()); }
 
     std::u32string maskText_;
     std::vector<Slot> slots_;  // one per mask position; empty when plain
     std::u32string chars_;     // the displayed characters, one per mask position
     char32_t prompt_ = U'_';
-    int32_t selStart_ = 0;
-    int32_t selLength_ = 0;
-    bool caretAtStart_ = false;  // the caret is at the selection's start (Shift+Left, ...)
+    Selection sel_;
     LineEdit plain_;
 };
 
